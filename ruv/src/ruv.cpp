@@ -1,0 +1,1 @@
+#include "ruv/ruv.h"
