@@ -1,0 +1,175 @@
+// The matrix kinds: what they hold, how their elements are reached, and the index checks they share.
+#ifndef REISTI_MATRIX_MATRIX_NEW_H
+#define REISTI_MATRIX_MATRIX_NEW_H
+
+#include <cassert>
+#include <cstddef>
+#include <cstdint>
+#include <vector>
+
+#include "matrix/allege.h"
+
+namespace qan::matrix_library {
+
+template <typename T>
+class Dmatrix;
+template <typename T>
+class UTmatrix;
+template <typename T>
+class Smatrix;
+
+// The general dense matrix, for T = double and T = int.
+//
+// 1. mn_ == m_ * n_, and it is also the number of stored elements.
+// 2. Element (i, j) is stored at i * n_ + j.
+// Only the constructor from a vector can break the first property, when the length is no multiple of the columns;
+// whatever grows the storage asserts it.
+//
+// Indices start at 0. Where a comment says "unchecked", a release build trusts the caller. A failed call leaves the
+// matrix as it was. Values and matrices passed in may be parts of the matrix itself.
+template <typename T>
+class matrix {
+  public:
+    matrix() = default;
+    matrix(int rows, int cols, const T& fill);
+    // Row by row; v.size() / cols rows, and a remainder is kept but belongs to no row (deliberately not rejected).
+    matrix(const std::vector<T>& v, int cols);
+    matrix(const Dmatrix<T>& d);
+    matrix(const UTmatrix<T>& u);
+    matrix(const Smatrix<T>& s);
+    matrix(const matrix& other);
+    matrix(matrix&& other) noexcept;
+    ~matrix() = default;
+
+    static matrix CreateRowVector(const std::vector<T>& v);
+
+    matrix& operator=(const matrix& other);
+    matrix& operator=(matrix&& other) noexcept;
+    matrix& operator=(const Dmatrix<T>& d);
+    matrix& operator=(const UTmatrix<T>& u);
+    matrix& operator=(const Smatrix<T>& s);
+    // Every element becomes x.
+    matrix& operator=(const T& x);
+    // Becomes the column v, unless the stored elements already equal v: then not even the dimensions change, on
+    // purpose.
+    matrix& operator=(const std::vector<T>& v);
+    void set(const T& x);
+    void swap(matrix& other) noexcept;
+
+    // New dimensions; every element becomes fill, old contents are never kept.
+    void Initialize(int rows, int cols, const T& fill);
+    void resize(int rows, int cols, const T& fill);
+    void ResizeStorage(int rows, int cols, const T& fill);
+
+    int rowCount() const { return m_; }
+    int colCount() const { return n_; }
+    int size() const { return mn_; }
+    bool empty() const { return mn_ == 0; }
+
+    // Unchecked.
+    T& operator()(int i, int j) {
+        assertElement(i, j);
+        return v_.data()[offset(i, j)];
+    }
+    const T& operator()(int i, int j) const {
+        assertElement(i, j);
+        return v_.data()[offset(i, j)];
+    }
+
+    T& at(int row, int column) {
+        QAN_ALLEGE(row >= 0 && row < m_);
+        QAN_ALLEGE(column >= 0 && column < n_);
+        return v_.data()[offset(row, column)];
+    }
+    const T& at(int row, int column) const {
+        QAN_ALLEGE(row >= 0 && row < m_);
+        QAN_ALLEGE(column >= 0 && column < n_);
+        return v_.data()[offset(row, column)];
+    }
+
+    // Checks nothing, and is meant to: generic callers name it for every kind.
+    void range_check(int, int) const {}
+
+    // The elements row by row.
+    T* data() { return v_.data(); }
+    const T* data() const { return v_.data(); }
+
+    matrix getRow(int i) const;                // unchecked; 1 by n
+    std::vector<T> getRowVector(int i) const;  // unchecked
+    matrix getCol(int j) const;                // m by 1
+    std::vector<T> getColVector(int j) const;
+    void setRow(int i, const matrix& r);          // the first row of r
+    void setRow(int i, const std::vector<T>& r);  // length unchecked
+    void setCol(int j, const matrix& c);          // the first elements of c
+    void setCol(int j, const std::vector<T>& c);  // length unchecked
+
+    // Appending needs amortized constant time per element. A matrix without elements takes the length of the first row
+    // or column; a single value has no length to offer and throws.
+    void addRow(const std::vector<T>& r);
+    void addRow(const T& x);
+    void addCol(const std::vector<T>& c);
+    void addCol(const T& x);
+
+    // Before row i or column j; the positions are unchecked.
+    void insertRow(int i, const T& x);
+    void insertRow(int i, const std::vector<T>& r);
+    void insertCol(int j, const T& x);
+    void insertCol(int j, const std::vector<T>& c);
+
+    void removeRow(int i);
+    void removeCol(int j);
+    matrix delRow(int i) const;
+    matrix delCol(int j) const;
+
+    // The rows by cols block whose first element is (r, c).
+    matrix getSubmatrix(int r, int c, int rows, int cols) const;
+    void setSubmatrix(int r, int c, const matrix& b);
+
+    matrix& operator+=(const matrix& other);
+    matrix& operator-=(const matrix& other);
+    matrix operator+(const matrix& other) const;
+    matrix operator-(const matrix& other) const;
+    matrix operator-() const;
+    matrix& operator*=(const T& x);
+    matrix operator*(const T& x) const;
+    // std::overflow_error when x is 0.
+    matrix& operator/=(const T& x);
+    matrix operator/(const T& x) const;
+    matrix transpose() const;
+
+    // Only a single column converts.
+    std::vector<T> ConvertToVector() const;
+    operator std::vector<T>() const { return ConvertToVector(); }
+    // The lower triangle of a matrix that is symmetric within kSymmetryFuzz.
+    Smatrix<T> ConvertToSmatrix() const;
+    void mFlattenMatrix(std::vector<T>& out, int start, bool byRows) const;
+
+    void CheckInvariant() const { QAN_ALLEGE(signature_ == matrixsignature_); }
+
+  private:
+    static constexpr std::uint32_t matrixsignature_ = 0xFEEDBAAA;
+
+    std::ptrdiff_t offset(int i, int j) const { return std::ptrdiff_t{i} * n_ + j; }
+    void assertElement([[maybe_unused]] int i, [[maybe_unused]] int j) const {
+        assert(0 <= i && i < m_);
+        assert(0 <= j && j < n_);
+    }
+    void checkRow(int i) const { QAN_ALLEGE(0 <= i && i < m_); }
+    void checkCol(int j) const { QAN_ALLEGE(0 <= j && j < n_); }
+    void checkStorage() const;
+    void openRow(int i, const T* values, std::ptrdiff_t step);
+    void openCol(int j, const T* values, std::ptrdiff_t step);
+    void setDimensions(int rows, int cols);
+
+    std::uint32_t signature_ = matrixsignature_;
+    int m_ = 0;
+    int n_ = 0;
+    int mn_ = 0;
+    std::vector<T> v_;
+};
+
+}  // namespace qan::matrix_library
+
+#include "matrix/matrix_impl.h"
+
+#endif
