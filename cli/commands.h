@@ -1,0 +1,14 @@
+#ifndef REISTI_CLI_COMMANDS_H
+#define REISTI_CLI_COMMANDS_H
+
+#include <CLI/App.hpp>
+
+namespace cli {
+
+// Each adds its subcommand; parsing the command line then runs it.
+
+void addDsdCommand(CLI::App& app);
+
+}  // namespace cli
+
+#endif
