@@ -1,8 +1,11 @@
-#include "matrix/matrix_impl.h"
+#include "matrix/matrix_new.h"
 
 namespace qan::matrix_library {
 
 template class matrix<double>;
 template class matrix<int>;
+template class Dmatrix<double>;
+template class UTmatrix<double>;
+template class Smatrix<double>;
 
 }  // namespace qan::matrix_library

@@ -13,7 +13,8 @@
 
 namespace qan::matrix_library {
 
-// Two elements mirror each other when they differ by less than this, absolutely or relative to the greater.
+// Two elements mirror each other when they differ by less than this, absolutely or, with this as the floor, relative to
+// the greater.
 inline constexpr double kSymmetryFuzz = 4e-12;
 
 template <typename T>
@@ -146,10 +147,8 @@ template <typename T>
 std::vector<T> matrix<T>::getColVector(int j) const {
     checkCol(j);
     std::vector<T> column(static_cast<std::size_t>(m_));
-    const T* element = data() + j;
-    for (T& target : column) {
-        target = *element;
-        element += n_;
+    for (int i = 0; i < m_; ++i) {
+        column.data()[i] = data()[offset(i, j)];
     }
     return column;
 }
@@ -180,10 +179,9 @@ template <typename T>
 void matrix<T>::setCol(int j, const std::vector<T>& c) {
     checkCol(j);
     assert(c.size() <= static_cast<std::size_t>(m_));
-    T* element = data() + j;
+    int i = 0;
     for (const T& value : c) {
-        *element = value;
-        element += n_;
+        data()[offset(i++, j)] = value;
     }
 }
 
@@ -471,8 +469,30 @@ std::vector<T> matrix<T>::ConvertToVector() const {
     return v_;
 }
 
-extern template class matrix<double>;
-extern template class matrix<int>;
+// Whether two elements mirror each other; false when either is not a number or their difference is none.
+template <typename T>
+bool mirrorsWithinFuzz(const T& a, const T& b) {
+    const double first = static_cast<double>(a);
+    const double second = static_cast<double>(b);
+    const double difference = std::fabs(first - second);
+    if (kSymmetryFuzz > difference) return true;
+    return std::max(std::fabs(first), std::fabs(second)) * kSymmetryFuzz + kSymmetryFuzz > difference;
+}
+
+template <typename T>
+Smatrix<T> matrix<T>::ConvertToSmatrix() const {
+    const int rows = m_;
+    const int cols = n_;
+    QAN_ALLEGE(rows == cols);
+    for (int i = 0; i < rows; ++i) {
+        for (int j = 0; j < i; ++j) {
+            if (!mirrorsWithinFuzz((*this)(i, j), (*this)(j, i))) {
+                throw MatrixException("Smatrix cast: result not a symmetric matrix");
+            }
+        }
+    }
+    return Smatrix<T>(*this, true);
+}
 
 }  // namespace qan::matrix_library
 

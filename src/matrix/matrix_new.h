@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "matrix/allege.h"
+#include "matrix/matrix_dimensions.h"
 
 namespace qan::matrix_library {
 
@@ -168,8 +169,213 @@ class matrix {
     std::vector<T> v_;
 };
 
+// The square kinds below store their order m_ and only the elements that their pattern leaves free. Positions outside
+// the pattern read 0; a write there is discarded, on purpose, by handing out scratch_. Order and packed indices are
+// ints, as in the dense matrix.
+
+// Diagonal: v_[i] is element (i, i).
+template <typename T>
+class Dmatrix {
+  public:
+    Dmatrix() = default;
+    Dmatrix(int n, const T& fill);
+    Dmatrix(const Dmatrix& other) = default;
+    Dmatrix(Dmatrix&& other) noexcept { swap(other); }
+    ~Dmatrix() = default;
+    Dmatrix& operator=(Dmatrix other) noexcept {
+        swap(other);
+        return *this;
+    }
+    void swap(Dmatrix& other) noexcept;
+
+    void resize(int n, const T& fill);  // old contents are dropped
+    void set(const T& x);
+
+    int rowCount() const { return m_; }
+    int colCount() const { return m_; }
+    int size() const { return m_; }
+
+    // Unchecked.
+    T& operator()(int i, int j) { return i == j ? v_.data()[i] : (scratch_ = T()); }
+    const T& operator()(int i, int j) const { return i == j ? v_.data()[i] : zero_; }
+    T& at(int row, int column) {
+        QAN_ALLEGE(row >= 0 && row < m_);
+        QAN_ALLEGE(column >= 0 && column < m_);
+        return (*this)(row, column);
+    }
+    const T& at(int row, int column) const {
+        QAN_ALLEGE(row >= 0 && row < m_);
+        QAN_ALLEGE(column >= 0 && column < m_);
+        return (*this)(row, column);
+    }
+    void range_check(int, int) const {}
+
+    // The diagonal.
+    T* data() { return v_.data(); }
+    const T* data() const { return v_.data(); }
+
+    Dmatrix operator-() const;
+    Dmatrix transpose() const { return *this; }
+    matrix<T> getCol(int j) const;  // unchecked; m by 1
+    void removeColRow(int i);       // unchecked
+    // Does nothing when r and c differ, on purpose: such a block has no stored place.
+    void setSubmatrix(int r, int c, const Dmatrix& d);
+
+  private:
+    T zero_ = T();
+    int m_ = 0;
+    std::vector<T> v_;
+    T scratch_ = T();
+};
+
+// Upper-triangular: row i holds columns i to m_ - 1, row after row.
+template <typename T>
+class UTmatrix {
+  public:
+    UTmatrix() = default;
+    UTmatrix(int n, const T& fill);
+    UTmatrix(int m, const std::vector<T>& v);  // packed as above
+    UTmatrix(const UTmatrix& other) = default;
+    UTmatrix(UTmatrix&& other) noexcept { swap(other); }
+    ~UTmatrix() = default;
+    UTmatrix& operator=(UTmatrix other) noexcept {
+        swap(other);
+        return *this;
+    }
+    void swap(UTmatrix& other) noexcept;
+
+    static int calculate_size(int m) { return triangleCount(m); }
+    void resize(int n, const T& fill);  // old contents are dropped
+    void set(const T& x);
+
+    int rowCount() const { return m_; }
+    int colCount() const { return m_; }
+    int size() const { return m_; }  // the order, and meant to be, unlike Smatrix
+
+    // Unchecked.
+    T& operator()(int i, int j) { return i <= j ? v_.data()[offset(i, j)] : (scratch_ = T()); }
+    const T& operator()(int i, int j) const { return i <= j ? v_.data()[offset(i, j)] : zero_; }
+    T& at(int row, int column) {
+        QAN_ALLEGE(row >= 0 && row < m_);
+        QAN_ALLEGE(column >= 0 && column < m_);
+        return (*this)(row, column);
+    }
+    const T& at(int row, int column) const {
+        QAN_ALLEGE(row >= 0 && row < m_);
+        QAN_ALLEGE(column >= 0 && column < m_);
+        return (*this)(row, column);
+    }
+    void range_check(int, int) const {}
+
+    // The packed elements.
+    T* data() { return v_.data(); }
+    const T* data() const { return v_.data(); }
+
+    UTmatrix operator-() const;
+    matrix<T> transpose() const;  // dense: no kind of ours stores a lower triangle
+
+  private:
+    std::ptrdiff_t offset(std::ptrdiff_t i, std::ptrdiff_t j) const { return i * m_ - i * (i + 1) / 2 + j; }
+
+    int m_ = 0;
+    std::vector<T> v_;
+    T zero_ = T();
+    T scratch_ = T();
+};
+
+// Symmetric: row a of the lower triangle holds columns 0 to a, row after row; (i, j) and (j, i) are one element.
+template <typename T>
+class Smatrix {
+  public:
+    Smatrix() = default;
+    Smatrix(int n, const T& fill);
+    // The lower triangle of a matrix that is symmetric within kSymmetryFuzz.
+    Smatrix(const matrix<T>& a);
+    // One triangle of a square matrix, whatever the other holds.
+    Smatrix(const matrix<T>& a, bool lower);
+    Smatrix(const Smatrix& other) = default;
+    Smatrix(Smatrix&& other) noexcept { swap(other); }
+    ~Smatrix() = default;
+    Smatrix& operator=(Smatrix other) noexcept {
+        swap(other);
+        return *this;
+    }
+    Smatrix& operator=(const matrix<T>& a);
+    void swap(Smatrix& other) noexcept;
+
+    static int calculate_size(int m) { return triangleCount(m); }
+    void resize(int n, const T& fill);  // old contents are dropped
+    void set(const T& x);
+
+    int rowCount() const { return m_; }
+    int colCount() const { return m_; }
+    int size() const { return static_cast<int>(v_.size()); }  // stored elements, and meant to be, unlike UTmatrix
+    bool isEmpty() const { return m_ == 0; }
+
+    // Unchecked.
+    T& operator()(int i, int j) { return v_.data()[offset(i, j)]; }
+    const T& operator()(int i, int j) const { return v_.data()[offset(i, j)]; }
+    T& at(int i, int j) {
+        QAN_ALLEGE(i >= 0 && i < m_);
+        QAN_ALLEGE(j >= 0 && j < m_);
+        return (*this)(i, j);
+    }
+    const T& at(int i, int j) const {
+        QAN_ALLEGE(i >= 0 && i < m_);
+        QAN_ALLEGE(j >= 0 && j < m_);
+        return (*this)(i, j);
+    }
+    void range_check(int, int) const {}
+
+    // The packed elements.
+    T* data() { return v_.data(); }
+    const T* data() const { return v_.data(); }
+
+    Smatrix operator-() const;
+    Smatrix transpose() const { return *this; }
+    std::vector<T> getRowVector(int i) const;
+    std::vector<T> getColVector(int j) const;
+    matrix<T> getSubmatrix(int r, int c, int rows, int cols) const;  // unchecked
+
+    // A new row and column before target_row, which may equal the order.
+    void insertColRow(int target_row, const T& x);
+    void insertColRow(int target_row, const std::vector<T>& v);
+    void removeColRow(int j);
+    Smatrix delColRow(int j) const;
+
+    // Adds a[k] * c[i] + b[k] to the elements (i, k), k <= i, of the first n rows; n and the lengths are unchecked.
+    void UpdateForFisher(const std::vector<T>& a, const std::vector<T>& b, const std::vector<T>& c, int n);
+
+    UTmatrix<T> mSmatrixToUTmatrix() const;
+    void mFlattenMatrix(std::vector<T>& out, int start, bool byRows) const;
+
+  private:
+    static std::ptrdiff_t offset(std::ptrdiff_t i, std::ptrdiff_t j) {
+        return i >= j ? i * (i + 1) / 2 + j : j * (j + 1) / 2 + i;
+    }
+    void checkStorage() const;
+
+    int m_ = 0;
+    std::vector<T> v_;
+};
+
 }  // namespace qan::matrix_library
 
+#include "matrix/matrix_conversions.h"
+#include "matrix/matrix_diagonal_impl.h"
 #include "matrix/matrix_impl.h"
+#include "matrix/matrix_symmetric_impl.h"
+#include "matrix/matrix_upper_impl.h"
+
+namespace qan::matrix_library {
+
+// Compiled once, in matrix_impl.cpp.
+extern template class matrix<double>;
+extern template class matrix<int>;
+extern template class Dmatrix<double>;
+extern template class UTmatrix<double>;
+extern template class Smatrix<double>;
+
+}  // namespace qan::matrix_library
 
 #endif
