@@ -8,6 +8,8 @@ namespace cli {
 // Each adds its subcommand; parsing the command line then runs it.
 
 void addDsdCommand(CLI::App& app);
+void addCentroidCommand(CLI::App& app);
+void addLatticeCommand(CLI::App& app);
 
 }  // namespace cli
 

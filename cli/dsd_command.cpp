@@ -101,18 +101,8 @@ nlohmann::ordered_json describe(const DsdOptions& options, const std::vector<Fac
     head["replicates"] = options.replicates;
     head["blocks"] = options.blocks;
     head["factors"] = nlohmann::ordered_json::array();
-    for (const Factor& factor : factors) {
-        nlohmann::ordered_json entry;
-        entry["name"] = factor.name;
-        if (factor.isCategorical) {
-            entry["levels"] = {factor.lowWord, factor.highWord};
-        } else if (!factor.isCoded) {
-            entry["low"] = factor.low;
-            entry["high"] = factor.high;
-            if (!factor.unit.empty()) entry["unit"] = factor.unit;
-        }
-        head["factors"].push_back(entry);
-    }
+    for (const Factor& factor : factors)
+        head["factors"].push_back(factor.describe());
     return head;
 }
 

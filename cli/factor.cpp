@@ -1,6 +1,7 @@
 #include "factor.h"
 
 #include <fmt/format.h>
+#include <nlohmann/json.hpp>
 #include <optional>
 #include <vector>
 
@@ -60,6 +61,19 @@ Cell Factor::level(int coded, bool showCoded) const {
     return coded < 0 ? low : high;
 }
 
+nlohmann::ordered_json Factor::describe() const {
+    nlohmann::ordered_json entry;
+    entry["name"] = name;
+    if (isCategorical) {
+        entry["levels"] = {lowWord, highWord};
+    } else if (!isCoded) {
+        entry["low"] = low;
+        entry["high"] = high;
+        if (!unit.empty()) entry["unit"] = unit;
+    }
+    return entry;
+}
+
 Factor parseFactor(const std::string& option, std::string_view text) {
     const std::string where = quoted(option, text);
     Factor factor;
@@ -69,13 +83,6 @@ Factor parseFactor(const std::string& option, std::string_view text) {
     } else {
         readRange(where, rest, factor);
     }
-    return factor;
-}
-
-Factor parseContinuousFactor(const std::string& option, std::string_view text) {
-    const std::string where = quoted(option, text);
-    Factor factor;
-    readRange(where, takeName(where, text, factor), factor);
     return factor;
 }
 

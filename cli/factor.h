@@ -1,6 +1,7 @@
 #ifndef REISTI_CLI_FACTOR_H
 #define REISTI_CLI_FACTOR_H
 
+#include <nlohmann/json_fwd.hpp>
 #include <string>
 #include <string_view>
 
@@ -22,13 +23,13 @@ struct Factor {
 
     /// What a run shows for the coded level -1, 0 or 1.
     Cell level(int coded, bool showCoded) const;
+
+    /// Name, levels and unit, as the JSON output tells them.
+    nlohmann::ordered_json describe() const;
 };
 
 /// Reads "name=low:high", "name=low:high:unit" or "name=word|word". Throws UsageError naming `option`.
 Factor parseFactor(const std::string& option, std::string_view text);
-
-/// Reads "name=low:high" or "name=low:high:unit" only.
-Factor parseContinuousFactor(const std::string& option, std::string_view text);
 
 }  // namespace cli
 

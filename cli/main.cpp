@@ -28,6 +28,8 @@ int run(int argc, char** argv) {
     app.set_version_flag("--version", std::string("reisti ") + des_Version());
     app.footer("reisti COMMAND --help shows the options of a command and a worked example.");
     cli::addDsdCommand(app);
+    cli::addCentroidCommand(app);
+    cli::addLatticeCommand(app);
     try {
         app.parse(argc, argv);
     } catch (const CLI::ParseError& error) {

@@ -1,0 +1,105 @@
+#include <CLI/Config.hpp>
+#include <CLI/Formatter.hpp>
+#include <cmath>
+#include <memory>
+#include <nlohmann/json.hpp>
+
+#include "commands.h"
+#include "mixture_options.h"
+#include "output_file.h"
+#include "usage_error.h"
+
+namespace cli {
+
+namespace {
+
+struct LatticeOptions {
+    std::int32_t degree = 0;
+    bool center = false;
+    MixtureOptions mixture;
+};
+
+double choose(double n, double k) {
+    double count = 1;
+    for (double i = 1; i <= k; ++i)
+        count = count * (n - k + i) / i;
+    return std::round(count);
+}
+
+/// Runs of a centroid design: C(q, t) points of type t, the last of which is the overall centroid.
+double countCentroidRuns(const MixtureRequest& request) {
+    const auto q = static_cast<double>(request.components.size());
+    std::vector<double> points;
+    for (double t = 1; t < q; ++t)
+        points.push_back(choose(q, t));
+    return request.countRuns(points, 1, request.axial ? q : 0);
+}
+
+/// Runs of a lattice design: C(q, t) C(m-1, t-1) mixtures of degree m have t nonzero proportions.
+double countLatticeRuns(const MixtureRequest& request, double degree, bool center) {
+    const auto q = static_cast<double>(request.components.size());
+    std::vector<double> points;
+    for (double t = 1; t <= q && t <= degree; ++t)
+        points.push_back(choose(q, t) * choose(degree - 1, t - 1));
+    const bool holdsCentroid = std::fmod(degree, q) == 0;
+    if (holdsCentroid) points.back() -= 1;
+    return request.countRuns(points, holdsCentroid || center ? 1 : 0, request.axial ? q : 0);
+}
+
+void runCentroid(const MixtureOptions& options) {
+    checkOutputFile(options.shared.output, options.shared.force);
+    const MixtureRequest request = readRequest(options);
+    options.shared.checkRunCount(countCentroidRuns(request));
+    const MixtureRecord record = makeRecord(request);
+    checkMixtureCode(des_RunSimplexCentroidDesign(record.get()), request);
+    reportTightenedBounds(record, request);
+    showMixtureDesign(options, request, record, {{"design", "simplex centroid"}});
+}
+
+void runLattice(const LatticeOptions& options) {
+    checkOutputFile(options.mixture.shared.output, options.mixture.shared.force);
+    const MixtureRequest request = readRequest(options.mixture);
+    if (options.degree < 1) throw UsageError("--degree", "the degree of a lattice is at least 1");
+    options.mixture.shared.checkRunCount(countLatticeRuns(request, options.degree, options.center));
+    const MixtureRecord record = makeRecord(request);
+    checkMixtureCode(des_RunSimplexLatticeDesign(record.get(), options.degree, options.center ? 1 : 0), request);
+    reportTightenedBounds(record, request);
+    showMixtureDesign(options.mixture, request, record, {{"design", "simplex lattice"}, {"degree", options.degree}});
+}
+
+}  // namespace
+
+void addCentroidCommand(CLI::App& app) {
+    CLI::App* command =
+        app.add_subcommand("centroid", "Simplex centroid design: the centroids of all subsets of components");
+    const auto options = std::make_shared<MixtureOptions>();
+    addMixtureOptions(*command, *options);
+    command->footer(
+        "Columns: std_order, run_order, point_type (1 vertex, k blend of k components, 0 overall\n"
+        "centroid, -1 axial point), amount with --total or --amount, components, process variables.\n"
+        "\n"
+        "Example: a fruit punch of three juices with lower bounds, 100 ounces in all, centroid three times:\n"
+        "  reisti centroid --component \"watermelon=20:100\" --component \"pineapple=10:100\" \\\n"
+        "    --component \"orange=10:100\" --total 100 --replicates center=3 --response Taste --seed 7");
+    command->callback([options] { runCentroid(*options); });
+}
+
+void addLatticeCommand(CLI::App& app) {
+    CLI::App* command = app.add_subcommand("lattice", "Simplex lattice design: all mixtures in steps of 1/degree");
+    const auto options = std::make_shared<LatticeOptions>();
+    command->add_option("--degree", options->degree, "Steps between nothing and all of a component")
+        ->required()
+        ->type_name("M");
+    command->add_flag("--center", options->center, "Add the overall centroid where the lattice does not hold it");
+    addMixtureOptions(*command, options->mixture);
+    command->footer(
+        "Columns: std_order, run_order, point_type (number of nonzero proportions, 0 overall\n"
+        "centroid, -1 axial point), amount with --total or --amount, components, process variables.\n"
+        "\n"
+        "Example: three polymers blended in halves, pure ones spun twice and blends three times:\n"
+        "  reisti lattice --degree 2 --component polyethylene --component polystyrene \\\n"
+        "    --component polypropylene --replicates vertex=2,2=3 --response Elongation --seed 7");
+    command->callback([options] { runLattice(*options); });
+}
+
+}  // namespace cli
