@@ -53,7 +53,7 @@ void runCentroid(const MixtureOptions& options) {
     const MixtureRecord record = makeRecord(request);
     checkMixtureCode(des_RunSimplexCentroidDesign(record.get()), request);
     reportTightenedBounds(record, request);
-    showMixtureDesign(options, request, record, {{"design", "simplex centroid"}});
+    showMixtureDesign(options, request, record, nlohmann::ordered_json::object({{"design", "simplex centroid"}}));
 }
 
 void runLattice(const LatticeOptions& options) {
@@ -64,7 +64,8 @@ void runLattice(const LatticeOptions& options) {
     const MixtureRecord record = makeRecord(request);
     checkMixtureCode(des_RunSimplexLatticeDesign(record.get(), options.degree, options.center ? 1 : 0), request);
     reportTightenedBounds(record, request);
-    showMixtureDesign(options.mixture, request, record, {{"design", "simplex lattice"}, {"degree", options.degree}});
+    showMixtureDesign(options.mixture, request, record,
+                      nlohmann::ordered_json::object({{"design", "simplex lattice"}, {"degree", options.degree}}));
 }
 
 }  // namespace
