@@ -1,0 +1,32 @@
+// What each level offers; the public headers of this folder call the best available one.
+#ifndef REISTI_MATRIX_KERNELS_LEVEL_TABLE_H
+#define REISTI_MATRIX_KERNELS_LEVEL_TABLE_H
+
+#include <cstddef>
+
+#include "matrix/kernels/level.h"
+
+namespace reisti::kernels {
+
+struct LevelTable {
+    using Product = void (*)(const double* a, const double* b, double* c, std::size_t m, std::size_t k, std::size_t n);
+
+    Product product;
+    Product productLeftTransposed;
+    Product productRightTransposed;
+};
+
+extern const LevelTable kBaselineTable;
+#ifdef __x86_64__
+extern const LevelTable kAvx2Table;
+extern const LevelTable kAvx512Table;
+#endif
+
+// The level must be available.
+const LevelTable& tableOf(Level level);
+
+inline const LevelTable& bestTable() { return tableOf(bestLevel()); }
+
+}  // namespace reisti::kernels
+
+#endif
