@@ -25,7 +25,9 @@ extern const LevelTable kAvx512Table;
 // The level must be available.
 const LevelTable& tableOf(Level level);
 
-inline const LevelTable& bestTable() { return tableOf(bestLevel()); }
+inline const LevelTable& bestTable() {
+    return tableOf(bestLevel());
+}
 
 }  // namespace reisti::kernels
 
