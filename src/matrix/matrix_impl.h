@@ -22,10 +22,13 @@ matrix<T>::matrix(int rows, int cols, const T& fill)
     : m_(rows), n_(cols), mn_(elementCount(rows, cols)), v_(static_cast<std::size_t>(mn_), fill) {}
 
 template <typename T>
-matrix<T>::matrix(const std::vector<T>& v, int cols) {
+matrix<T>::matrix(const std::vector<T>& v, int cols) : matrix(std::vector<T>(v), cols) {}
+
+template <typename T>
+matrix<T>::matrix(std::vector<T>&& v, int cols) {
     const int length = toDimension(v.size());
     if (cols < 0 || (cols == 0 && length > 0)) throw MatrixException("matrix: a vector needs at least one column");
-    v_ = v;
+    v_ = std::move(v);
     setDimensions(cols == 0 ? 0 : length / cols, cols);
 }
 

@@ -35,6 +35,8 @@ class matrix {
     matrix(int rows, int cols, const T& fill);
     // Row by row; v.size() / cols rows, and a remainder is kept but belongs to no row (deliberately not rejected).
     matrix(const std::vector<T>& v, int cols);
+    // The same, taking over the storage of v: tables of hundreds of megabytes are built row by row and then handed over.
+    matrix(std::vector<T>&& v, int cols);
     matrix(const Dmatrix<T>& d);
     matrix(const UTmatrix<T>& u);
     matrix(const Smatrix<T>& s);
