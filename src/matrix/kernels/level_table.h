@@ -10,10 +10,13 @@ namespace reisti::kernels {
 
 struct LevelTable {
     using Product = void (*)(const double* a, const double* b, double* c, std::size_t m, std::size_t k, std::size_t n);
+    using AccumulateProduct = void (*)(const double* a, std::size_t aStride, const double* b, std::size_t bStride,
+                                       double* c, std::size_t cStride, std::size_t m, std::size_t k, std::size_t n);
 
     Product product;
     Product productLeftTransposed;
     Product productRightTransposed;
+    AccumulateProduct accumulateProduct;
 };
 
 extern const LevelTable kBaselineTable;

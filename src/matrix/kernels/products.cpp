@@ -24,4 +24,9 @@ void productRightTransposed(const double* a, const double* b, double* c, std::si
     bestTable().productRightTransposed(a, b, c, m, k, n);
 }
 
+void accumulateProduct(const double* a, std::size_t aStride, const double* b, std::size_t bStride, double* c,
+                       std::size_t cStride, std::size_t m, std::size_t k, std::size_t n) {
+    bestTable().accumulateProduct(a, aStride, b, bStride, c, cStride, m, k, n);
+}
+
 }  // namespace reisti::kernels

@@ -21,6 +21,11 @@ void productLeftTransposed(const double* a, const double* b, double* c, std::siz
 // c (m x n) = a (m x k) * transpose of b (n x k).
 void productRightTransposed(const double* a, const double* b, double* c, std::size_t m, std::size_t k, std::size_t n);
 
+// c (m x n) += a (m x k) * b (k x n), rows the given strides apart. Each sum goes on from the value in c, so that a
+// product may be computed in several calls with ascending ranges of k.
+void accumulateProduct(const double* a, std::size_t aStride, const double* b, std::size_t bStride, double* c,
+                       std::size_t cStride, std::size_t m, std::size_t k, std::size_t n);
+
 }  // namespace reisti::kernels
 
 #endif
