@@ -107,7 +107,7 @@ nlohmann::ordered_json describe(const DsdOptions& options, const std::vector<Fac
 }
 
 void run(const DsdOptions& options) {
-    checkOutputFile(options.shared.output, options.shared.force);
+    checkOutputFile(options.shared.output.file, options.shared.output.force);
     const std::vector<Factor> factors = readFactors(options);
     const std::optional<double> seed = options.shared.seed();
     const ScreeningDesign design = build(options, factors, seed);

@@ -15,6 +15,12 @@
 
 namespace cli {
 
+namespace {
+
+constexpr const char* kOutputGroup = "Output";
+
+}  // namespace
+
 std::optional<double> SharedOptions::seed() const {
     if (standardOrder) return std::nullopt;
     double seed = 0;
@@ -37,8 +43,24 @@ void SharedOptions::checkRunCount(double runs) const {
     }
 }
 
+void addOutputOptions(CLI::App& command, OutputOptions& options) {
+    command.add_option("--format", options.format, "table, csv or json")
+        ->check(CLI::IsMember({"table", "csv", "json"}))
+        ->capture_default_str()
+        ->type_name("FORMAT")
+        ->group(kOutputGroup);
+    command.add_option("--decimal-mark", options.decimalMark, "Decimal mark of tables and CSV: . or ,")
+        ->check(CLI::IsMember({".", ","}))
+        ->capture_default_str()
+        ->type_name("MARK")
+        ->group(kOutputGroup);
+    command.add_option("--output", options.file, "Write to a file instead of standard output")
+        ->type_name("FILE")
+        ->group(kOutputGroup);
+    command.add_flag("--force", options.force, "Replace an existing output file")->group(kOutputGroup);
+}
+
 void addSharedOptions(CLI::App& command, SharedOptions& options) {
-    const auto group = "Output";
     command.add_option("--seed", options.seedText, "Seed of the random run order; drawn and reported if not given")
         ->type_name("NUMBER")
         ->group("Randomization");
@@ -47,29 +69,29 @@ void addSharedOptions(CLI::App& command, SharedOptions& options) {
         ->check(CLI::IsMember({"run", "standard"}))
         ->capture_default_str()
         ->type_name("ORDER")
-        ->group(group);
-    command.add_option("--format", options.format, "table, csv or json")
-        ->check(CLI::IsMember({"table", "csv", "json"}))
-        ->capture_default_str()
-        ->type_name("FORMAT")
-        ->group(group);
-    command.add_option("--decimal-mark", options.decimalMark, "Decimal mark of tables and CSV: . or ,")
-        ->check(CLI::IsMember({".", ","}))
-        ->capture_default_str()
-        ->type_name("MARK")
-        ->group(group);
+        ->group(kOutputGroup);
     command.add_option("--response", options.responses, "Add an empty column for a response; may be repeated")
         ->allow_extra_args(false)
         ->type_name("NAME")
-        ->group(group);
-    command.add_option("--output", options.output, "Write to a file instead of standard output")
-        ->type_name("FILE")
-        ->group(group);
-    command.add_flag("--force", options.force, "Replace an existing output file")->group(group);
+        ->group(kOutputGroup);
+    addOutputOptions(command, options.output);
     command.add_option("--max-runs", options.maxRuns, "Refuse designs with more runs than this")
         ->capture_default_str()
         ->type_name("COUNT")
-        ->group(group);
+        ->group(kOutputGroup);
+}
+
+void writeTable(const OutputOptions& options, const DesignTable& table, const nlohmann::ordered_json& head) {
+    writeOutput(options.file, options.force, [&](std::ostream& out) {
+        const char mark = options.decimalMark.front();
+        if (options.format == "json") {
+            writeJson(out, table, head);
+        } else if (options.format == "csv") {
+            writeCsv(out, table, mark);
+        } else {
+            writeText(out, table, mark);
+        }
+    });
 }
 
 DesignTable startTable(const SharedOptions& options, std::size_t numRuns,
@@ -93,15 +115,7 @@ void finishTable(const SharedOptions& options, std::optional<double> seed, Desig
     }
     head["seed"] = seed ? nlohmann::ordered_json(*seed) : nlohmann::ordered_json(nullptr);
     if (seed) std::cerr << "seed " << formatExact(*seed, '.') << '\n';
-    writeOutput(options.output, options.force, [&](std::ostream& out) {
-        if (options.format == "json") {
-            writeJson(out, table, head);
-        } else if (options.format == "csv") {
-            writeCsv(out, table, options.mark());
-        } else {
-            writeText(out, table, options.mark());
-        }
-    });
+    writeTable(options.output, table, head);
 }
 
 }  // namespace cli

@@ -14,26 +14,35 @@
 
 namespace cli {
 
-/// What every design command has: how to randomize, how to show the result and where to.
+/// How to show a table and where to.
+struct OutputOptions {
+    std::string format = "table";
+    std::string decimalMark = ".";
+    std::string file;
+    bool force = false;
+};
+
+/// What every design command has: how to randomize, and how to show the result.
 struct SharedOptions {
     std::string seedText;
     bool standardOrder = false;
     std::string rowOrder = "run";
-    std::string format = "table";
-    std::string decimalMark = ".";
-    std::string output;
-    bool force = false;
     std::vector<std::string> responses;
     std::uint64_t maxRuns = 1'000'000;
+    OutputOptions output;
 
     /// The seed to hand to the library: as given, or drawn. Nothing when the design is not randomized.
     std::optional<double> seed() const;
-    char mark() const { return decimalMark.front(); }
     /// Throws UsageError when more runs are asked for than --max-runs.
     void checkRunCount(double runs) const;
 };
 
+void addOutputOptions(CLI::App& command, OutputOptions& options);
+
 void addSharedOptions(CLI::App& command, SharedOptions& options);
+
+/// Writes a table as the options say; `head` leads the JSON output.
+void writeTable(const OutputOptions& options, const DesignTable& table, const nlohmann::ordered_json& head);
 
 /// The key columns std_order and run_order, and the rows in the order that the options ask for.
 DesignTable startTable(const SharedOptions& options, std::size_t numRuns,

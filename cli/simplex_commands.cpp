@@ -47,7 +47,7 @@ double countLatticeRuns(const MixtureRequest& request, double degree, bool cente
 }
 
 void runCentroid(const MixtureOptions& options) {
-    checkOutputFile(options.shared.output, options.shared.force);
+    checkOutputFile(options.shared.output.file, options.shared.output.force);
     const MixtureRequest request = readRequest(options);
     options.shared.checkRunCount(countCentroidRuns(request));
     const MixtureRecord record = makeRecord(request);
@@ -57,7 +57,7 @@ void runCentroid(const MixtureOptions& options) {
 }
 
 void runLattice(const LatticeOptions& options) {
-    checkOutputFile(options.mixture.shared.output, options.mixture.shared.force);
+    checkOutputFile(options.mixture.shared.output.file, options.mixture.shared.output.force);
     const MixtureRequest request = readRequest(options.mixture);
     if (options.degree < 1) throw UsageError("--degree", "the degree of a lattice is at least 1");
     options.mixture.shared.checkRunCount(countLatticeRuns(request, options.degree, options.center));

@@ -66,5 +66,12 @@ int main(void) {
     FIELD(des_MixtureDesignLinearConstraint, upperValue);
     FIELD(des_MixtureDesignLinearConstraint, coefficients);
     FIELD(des_MixtureDesignLinearConstraint, status);
+    RECORD(des_FractionalFactorial);
+    FIELD(des_FractionalFactorial, numFactors);
+    FIELD(des_FractionalFactorial, numRuns);
+    FIELD(des_FractionalFactorial, resolution);
+    FIELD(des_FractionalFactorial, maxBlocks);
+    FIELD(des_FractionalFactorial, generators);
+    FIELD(des_FractionalFactorial, blockGenerators);
     return 0;
 }

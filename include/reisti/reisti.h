@@ -432,6 +432,35 @@ REISTI_API int32_t des_RunExtremeVerticesDesign(des_MixtureDesign* design, int32
                                                 int32_t numConstraints, des_MixtureDesignLinearConstraint* constraints,
                                                 int32_t maxPoints);
 
+/* ---------------------------------------------------------------------------------------------------------------- */
+/* Fractional factorial catalog                                                                                     */
+/* ---------------------------------------------------------------------------------------------------------------- */
+
+/** A two-level factorial design, or a regular fraction of one, from which process variables are laid out. Factors are
+ * named A to H and J to P in order; the first log2(numRuns) are the base factors. */
+typedef struct des_FractionalFactorial {
+    /** Number of factors. */
+    int32_t numFactors;
+    /** Number of runs, a power of two. */
+    int32_t numRuns;
+    /** Resolution of the fraction; 0 for a full factorial. */
+    int32_t resolution;
+    /** Largest number of blocks; 0 when the design cannot be blocked. */
+    int32_t maxBlocks;
+    /** Words separated by blanks, one for each factor behind the base factors: the product that defines it. */
+    const char* generators;
+    /** Words separated by blanks: the first makes 2 blocks, the next two 4, the next three 8, and so on. */
+    const char* blockGenerators;
+} des_FractionalFactorial;
+
+/**
+ * @brief The catalog of two-level designs that process fractions are taken from.
+ * @param[out] count receives the number of entries; may be null
+ * @return [count] by number of runs, then of factors; static storage, never null
+ * @since 0.1
+ */
+REISTI_API const des_FractionalFactorial* des_FractionalFactorialCatalog(uint32_t* count);
+
 #ifdef __cplusplus
 }
 #endif

@@ -73,3 +73,11 @@ REISTI_OFFSET(des_MixtureDesignLinearConstraint, hasUpperValue, 16);
 REISTI_OFFSET(des_MixtureDesignLinearConstraint, upperValue, 24);
 REISTI_OFFSET(des_MixtureDesignLinearConstraint, coefficients, 32);
 REISTI_OFFSET(des_MixtureDesignLinearConstraint, status, 40);
+
+REISTI_LAYOUT(des_FractionalFactorial, 32);
+REISTI_OFFSET(des_FractionalFactorial, numFactors, 0);
+REISTI_OFFSET(des_FractionalFactorial, numRuns, 4);
+REISTI_OFFSET(des_FractionalFactorial, resolution, 8);
+REISTI_OFFSET(des_FractionalFactorial, maxBlocks, 12);
+REISTI_OFFSET(des_FractionalFactorial, generators, 16);
+REISTI_OFFSET(des_FractionalFactorial, blockGenerators, 24);

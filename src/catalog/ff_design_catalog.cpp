@@ -8,18 +8,9 @@ namespace reisti {
 
 namespace {
 
-struct CatalogRow {
-    int numFactors;
-    int numRuns;
-    int resolution;
-    int maxBlocks;
-    const char* generators;
-    const char* blockGenerators;
-};
-
 // Designs of greatest resolution in each size, full factorials with resolution 0.
 // clang-format off
-constexpr CatalogRow FF_DESIGNS[] = {
+constexpr des_FractionalFactorial FF_DESIGNS[] = {
     {2, 4, 0, 2, "", "AB"},
     {3, 4, 3, 0, "AB", ""},
     {3, 8, 0, 4, "", "ABC AB AC"},
@@ -74,13 +65,17 @@ constexpr CatalogRow FF_DESIGNS[] = {
 
 }  // namespace
 
+std::span<const des_FractionalFactorial> catalogRows() {
+    return FF_DESIGNS;
+}
+
 FFDesignCatalog::FFDesignCatalog() {
     FillFFDesignCatalog();
 }
 
 void FFDesignCatalog::FillFFDesignCatalog() {
     if (!designs_.empty()) return;
-    for (const CatalogRow& row : FF_DESIGNS)
+    for (const des_FractionalFactorial& row : FF_DESIGNS)
         AddFFCatalogDesign(row.numFactors, row.numRuns, row.resolution, row.maxBlocks, row.generators,
                            row.blockGenerators);
 }

@@ -2,8 +2,11 @@
 #define REISTI_CATALOG_FF_DESIGN_CATALOG_H
 
 #include <map>
+#include <span>
 #include <string>
 #include <vector>
+
+#include "reisti/reisti.h"
 
 namespace reisti {
 
@@ -20,6 +23,9 @@ struct FF_CATALOG_DESIGN {
     /// next three 8, and so on up to maxBlocks.
     std::vector<std::string> blockGenerators;
 };
+
+/// All designs by number of runs, then of factors, with their words as the text that is split when a catalog is filled.
+std::span<const des_FractionalFactorial> catalogRows();
 
 /// The catalog of two-level designs for 2 to 15 factors in 4 to 128 runs.
 class FFDesignCatalog {
