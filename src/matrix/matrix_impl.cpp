@@ -1,3 +1,4 @@
+#include "matrix/matrix_functions.h"
 #include "matrix/matrix_new.h"
 
 namespace qan::matrix_library {

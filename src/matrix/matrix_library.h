@@ -4,6 +4,8 @@
 
 #include "matrix/allege.h"
 #include "matrix/matrix_exceptions.h"
+#include "matrix/matrix_functions.h"
+#include "matrix/matrix_ludecomposition.h"
 #include "matrix/matrix_new.h"
 #include "matrix/trace.h"
 

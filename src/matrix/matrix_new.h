@@ -3,6 +3,7 @@
 #define REISTI_MATRIX_MATRIX_NEW_H
 
 #include <cassert>
+#include <concepts>
 #include <cstddef>
 #include <cstdint>
 #include <vector>
@@ -35,7 +36,8 @@ class matrix {
     matrix(int rows, int cols, const T& fill);
     // Row by row; v.size() / cols rows, and a remainder is kept but belongs to no row (deliberately not rejected).
     matrix(const std::vector<T>& v, int cols);
-    // The same, taking over the storage of v: tables of hundreds of megabytes are built row by row and then handed over.
+    // The same, taking over the storage of v: tables of hundreds of megabytes are built row by row and then handed
+    // over.
     matrix(std::vector<T>&& v, int cols);
     matrix(const Dmatrix<T>& d);
     matrix(const UTmatrix<T>& u);
@@ -147,6 +149,9 @@ class matrix {
     Smatrix<T> ConvertToSmatrix() const;
     void mFlattenMatrix(std::vector<T>& out, int start, bool byRows) const;
 
+    // As the free function of matrix_functions.h.
+    int EigenSystems(std::vector<double>& values, matrix<double>& vectors) const requires std::same_as<T, double>;
+
     void CheckInvariant() const { QAN_ALLEGE(signature_ == matrixsignature_); }
 
   private:
@@ -223,6 +228,10 @@ class Dmatrix {
     // Does nothing when r and c differ, on purpose: such a block has no stored place.
     void setSubmatrix(int r, int c, const Dmatrix& d);
 
+    // Writes the inverse, or an empty matrix when there is none, and returns a diagonal matrix of order 1 or 0 for
+    // success or failure, whose element is 0. The odd result is kept: callers read its order only.
+    Dmatrix inverse(Dmatrix* result) const;
+
   private:
     T zero_ = T();
     int m_ = 0;
@@ -275,6 +284,11 @@ class UTmatrix {
 
     UTmatrix operator-() const;
     matrix<T> transpose() const;  // dense: no kind of ours stores a lower triangle
+
+    // As the free functions of matrix_functions.h.
+    UTmatrix CholeskyDecomp(int start, int* failedRow, double* pivot) const;
+    std::vector<T> CholeskyBackSub(const std::vector<T>& b) const;
+    Smatrix<T> CholeskyInverse() const;
 
   private:
     std::ptrdiff_t offset(std::ptrdiff_t i, std::ptrdiff_t j) const { return i * m_ - i * (i + 1) / 2 + j; }
@@ -349,6 +363,8 @@ class Smatrix {
     void UpdateForFisher(const std::vector<T>& a, const std::vector<T>& b, const std::vector<T>& c, int n);
 
     UTmatrix<T> mSmatrixToUTmatrix() const;
+    // As the free function of matrix_functions.h.
+    bool CholeskyDecomp(UTmatrix<T>* factor) const;
     void mFlattenMatrix(std::vector<T>& out, int start, bool byRows) const;
 
   private:
