@@ -8,7 +8,8 @@ namespace reisti {
 
 namespace {
 
-// Designs of greatest resolution in each size, full factorials with resolution 0.
+// Ascending by runs, then by factors. 5 factors in 8 runs is said to have 2 blocks though no word makes them; hosts
+// rely on both.
 // clang-format off
 constexpr des_FractionalFactorial FF_DESIGNS[] = {
     {2, 4, 0, 2, "", "AB"},
@@ -75,9 +76,10 @@ FFDesignCatalog::FFDesignCatalog() {
 
 void FFDesignCatalog::FillFFDesignCatalog() {
     if (!designs_.empty()) return;
-    for (const des_FractionalFactorial& row : FF_DESIGNS)
+    for (const des_FractionalFactorial& row : FF_DESIGNS) {
         AddFFCatalogDesign(row.numFactors, row.numRuns, row.resolution, row.maxBlocks, row.generators,
                            row.blockGenerators);
+    }
 }
 
 void FFDesignCatalog::AddFFCatalogDesign(int numFactors, int numRuns, int resolution, int maxBlocks,

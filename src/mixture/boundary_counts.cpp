@@ -157,9 +157,10 @@ qan::matrix_library::matrix<int> binomialTable(std::uint32_t q) {
     // C(n, k) = C(n-1, k) + C(n-1, k-1), exact modulo 2^32 also where the logarithms behind NChooseK exceed 32 bits.
     for (int i = 0; i < rows; ++i) {
         table(i, 0) = i + 1;
-        for (int j = 1; j < i; ++j)
+        for (int j = 1; j < i; ++j) {
             table(i, j) = static_cast<int>(static_cast<std::uint32_t>(table(i - 1, j)) +
                                            static_cast<std::uint32_t>(table(i - 1, j - 1)));
+        }
         if (i > 0) table(i, i) = 1;
     }
     return table;

@@ -38,23 +38,9 @@ void probeMemory(std::uint64_t bytes) {
 des_MixtureRun* allocateRuns(std::uint32_t count, std::uint32_t numComponents, std::uint32_t numProcessVariables) {
     probeMemory(bytesOfRuns(count, numComponents, numProcessVariables));
     auto* const runs = new des_MixtureRun[count];
-    std::uint32_t begun = 0;
-    try {
-        while (begun < count) {
-            des_MixtureRun& run = runs[begun++];
-            run = {.runOrder = 0,
-                   .reserved = 1,
-                   .pointType = 0,
-                   .proportions = nullptr,
-                   .amount = 1.0,
-                   .processLevels = nullptr};
-            run.proportions = new double[numComponents];
-            if (numProcessVariables != 0) run.processLevels = new std::int32_t[numProcessVariables]();
-        }
-    } catch (...) {
-        releaseRuns(runs, begun);
-        throw;
-    }
+    const des_MixtureRun unwritten{
+        .runOrder = 0, .reserved = 1, .pointType = 0, .proportions = nullptr, .amount = 1.0, .processLevels = nullptr};
+    std::fill_n(runs, count, unwritten);
     return runs;
 }
 
@@ -70,6 +56,7 @@ void releaseRuns(des_MixtureRun* runs, std::uint32_t count) noexcept {
 void copyMixture(des_MixtureDesign& design, std::uint32_t from, std::uint32_t to) {
     const des_MixtureRun& source = design.runs[from];
     des_MixtureRun& copy = design.runs[to];
+    allocateArrays(design, copy);
     copy.runOrder = to + 1;
     copy.pointType = source.pointType;
     std::copy_n(source.proportions, design.numComponents, copy.proportions);

@@ -7,15 +7,22 @@
 
 namespace reisti {
 
-/// Allocates the runs of a design, each with its proportions, not yet set, and its process levels, all zero.
-/// @throw std::bad_alloc when there is no memory for all of them; nothing stays allocated then
+/// Allocates the runs of a design with their initial values and no arrays, after making sure that there is memory for
+/// the arrays, too. Each run gets its arrays when it is written: then its memory is touched once, while it is at hand.
+/// @throw std::bad_alloc when there is no memory for the whole design
 des_MixtureRun* allocateRuns(std::uint32_t count, std::uint32_t numComponents, std::uint32_t numProcessVariables);
+
+/// Allocates the arrays of one run of the design: process levels all zero, proportions not yet set.
+inline void allocateArrays(const des_MixtureDesign& design, des_MixtureRun& run) {
+    run.proportions = new double[design.numComponents];
+    if (design.numProcessVariables != 0) run.processLevels = new std::int32_t[design.numProcessVariables]();
+}
 
 /// Frees the first `count` runs with their arrays, and the array of runs.
 void releaseRuns(des_MixtureRun* runs, std::uint32_t count) noexcept;
 
-/// Makes run `to` a copy of the mixture of run `from`, in its own place in the order. Amount and process levels are
-/// those of the place and stay as they are.
+/// Writes run `to`, which has no arrays yet, as a copy of the mixture of run `from`, in its own place in the order.
+/// Amount and process levels belong to the place and are not copied.
 void copyMixture(des_MixtureDesign& design, std::uint32_t from, std::uint32_t to);
 
 }  // namespace reisti

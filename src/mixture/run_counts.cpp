@@ -39,16 +39,6 @@ std::uint64_t countSubsets(std::uint64_t n, std::uint64_t k) {
     return count;
 }
 
-std::size_t classOfType(std::int32_t pointType, std::uint32_t numComponents) {
-    if (pointType > 0) return static_cast<std::size_t>(pointType) - 1;
-    return std::size_t{numComponents} + (pointType == des_MixturePointCentroid ? 0 : 1);
-}
-
-std::int32_t typeOfClass(std::size_t pointClass, std::uint32_t numComponents) {
-    if (pointClass < numComponents) return static_cast<std::int32_t>(pointClass + 1);
-    return pointClass == numComponents ? des_MixturePointCentroid : des_MixturePointAxial;
-}
-
 PointClasses classifyPoints(const des_MixtureDesign& design, const std::vector<std::uint64_t>& basePoints,
                             bool hasCentroid, std::uint32_t axialPoints) {
     const std::size_t q = design.numComponents;

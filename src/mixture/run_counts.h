@@ -25,10 +25,10 @@ struct PointClasses {
 };
 
 /// The class of a point type: 1..q, 0 or des_MixturePointAxial.
-std::size_t classOfType(std::int32_t pointType, std::uint32_t numComponents);
-
-/// The type of the points in a class, the inverse of classOfType().
-std::int32_t typeOfClass(std::size_t pointClass, std::uint32_t numComponents);
+inline std::size_t classOfType(std::int32_t pointType, std::uint32_t numComponents) {
+    if (pointType > 0) return static_cast<std::size_t>(pointType) - 1;
+    return std::size_t{numComponents} + (pointType == des_MixturePointCentroid ? 0 : 1);
+}
 
 /// Sorts the points of a design into classes and gives each class the replicates that the record asks for.
 /// @param basePoints  entry t: base points of type t, for t = 0..q

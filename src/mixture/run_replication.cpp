@@ -42,9 +42,10 @@ void repeatPoints(des_MixtureDesign& design, const PointClasses& classes, std::u
 void repeatDesign(des_MixtureDesign& design, std::uint32_t& written) {
     const std::uint32_t points = written;
     if (points == 0) return;
-    for (std::uint32_t r = 1; r < design.designReplicates; ++r)
+    for (std::uint32_t r = 1; r < design.designReplicates; ++r) {
         for (std::uint32_t i = 0; i < points; ++i)
             copyMixture(design, i, written++);
+    }
 }
 
 void runAtEveryAmount(des_MixtureDesign& design, std::uint32_t& written) {

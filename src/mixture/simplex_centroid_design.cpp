@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <cstddef>
 #include <numeric>
-#include <stdexcept>
 
 #include "mixture/boundary_counts.h"
 #include "mixture/component_bounds.h"
@@ -150,21 +149,6 @@ void SimplexCentroidDesign::AugmentDesign() {
     runsAllocated_ = true;
 }
 
-bool SimplexCentroidDesign::IsTypeRun(std::int32_t pointType) const {
-    return design_->designReplicates != 0 && classes_.replicates[classOfType(pointType, design_->numComponents)] != 0;
-}
-
-des_MixtureRun& SimplexCentroidDesign::AppendRun(std::int32_t pointType) {
-    // The runs were counted by formula and are written by enumeration; should the two ever differ, nothing may be
-    // written behind the array.
-    if (runCounter_ == design_->numRuns) throw std::length_error("more runs than counted");
-    des_MixtureRun& run = design_->runs[runCounter_++];
-    run.runOrder = runCounter_;
-    run.pointType = pointType;
-    std::fill_n(run.proportions, design_->numComponents, 0.0);
-    return run;
-}
-
 void SimplexCentroidDesign::GenerateOverallCenterpoint() {}
 
 void SimplexCentroidDesign::GenerateAxialPoints() {
@@ -194,8 +178,10 @@ void SimplexCentroidDesign::SetProcessVariables(int& error) {
     error = crossWithProcessVariables(*design_, runCounter_);
     if (error == 0) return;
     // The host may read all runs that it finds in the record.
-    for (std::uint32_t i = runCounter_; i < design_->numRuns; ++i)
+    for (std::uint32_t i = runCounter_; i < design_->numRuns; ++i) {
+        allocateArrays(*design_, design_->runs[i]);
         std::fill_n(design_->runs[i].proportions, design_->numComponents, 0.0);
+    }
 }
 
 void SimplexCentroidDesign::RescaleMixtureCatalogDesigns() {

@@ -1,10 +1,13 @@
 #ifndef REISTI_MIXTURE_SIMPLEX_CENTROID_DESIGN_H
 #define REISTI_MIXTURE_SIMPLEX_CENTROID_DESIGN_H
 
+#include <algorithm>
 #include <cstdint>
+#include <stdexcept>
 #include <vector>
 
 #include "matrix/matrix_library.h"
+#include "mixture/run_array.h"
 #include "mixture/run_counts.h"
 #include "reisti/reisti.h"
 
@@ -18,7 +21,7 @@ namespace reisti {
 /// 2. the record's `runs` and `numRuns` are the caller's until AugmentDesign() has allocated all runs, and then final
 /// in
 ///    size;
-/// 3. runs 0 .. runCounter_-1 are written, those behind have proportions that were never set;
+/// 3. runs 0 .. runCounter_-1 are written, those behind have no arrays yet;
 /// 4. a class of points with 0 replicates is in the counts of the distinct points and in no run.
 class SimplexCentroidDesign {
   public:
@@ -90,6 +93,24 @@ class SimplexCentroidDesign {
 
     bool runsAllocated_ = false;
 };
+
+// Defined here so that the loops over all points, which may be millions, call nothing but the allocator.
+
+inline bool SimplexCentroidDesign::IsTypeRun(std::int32_t pointType) const {
+    return design_->designReplicates != 0 && classes_.replicates[classOfType(pointType, design_->numComponents)] != 0;
+}
+
+inline des_MixtureRun& SimplexCentroidDesign::AppendRun(std::int32_t pointType) {
+    // The runs were counted by formula and are written by enumeration; should the two ever differ, nothing may be
+    // written behind the array.
+    if (runCounter_ == design_->numRuns) throw std::length_error("more runs than counted");
+    des_MixtureRun& run = design_->runs[runCounter_++];
+    run.runOrder = runCounter_;
+    run.pointType = pointType;
+    allocateArrays(*design_, run);
+    std::fill_n(run.proportions, design_->numComponents, 0.0);
+    return run;
+}
 
 }  // namespace reisti
 

@@ -27,35 +27,47 @@ constexpr std::array<DegreeLimit, 7> DEGREE_LIMITS = {{
     {20, 2},
 }};
 
+/// What a component has of the degree.
+struct Part {
+    std::uint32_t component;
+    std::int32_t units;
+};
+
 /// The compositions of `degree` into q parts that may be 0, in decreasing lexicographic order from (degree, 0, .., 0).
+/// Only positive parts are kept, by component: a lattice of many components and low degree consists of zeros.
 class Compositions {
   public:
-    Compositions(std::uint32_t q, std::int32_t degree) : parts_(q, 0), positive_(1) { parts_[0] = degree; }
+    Compositions(std::uint32_t q, std::int32_t degree) : lastComponent_(q - 1), parts_{{0, degree}} {}
 
-    const std::vector<std::int32_t>& parts() const { return parts_; }
-    std::int32_t countPositive() const { return positive_; }
+    const std::vector<Part>& parts() const { return parts_; }
 
     /// False when the last composition, (0, .., 0, degree), has been reached.
     bool advance() {
-        // The last part and one unit of the rightmost positive part before it move to the place behind that part.
-        std::int32_t& last = parts_.back();
-        const std::int32_t carry = last + 1;
-        std::size_t from = parts_.size() - 1;
-        while (from > 0 && parts_[from - 1] == 0)
-            --from;
-        if (from == 0) return false;
-        if (last != 0) --positive_;
-        last = 0;
-        if (--parts_[from - 1] == 0) --positive_;
-        parts_[from] = carry;
-        ++positive_;
+        // All of the last component and one unit of the rightmost part before it move to the place behind that part.
+        std::int32_t carry = 1;
+        if (parts_.back().component == lastComponent_) {
+            carry += parts_.back().units;
+            parts_.pop_back();
+            if (parts_.empty()) return false;
+        }
+        Part& from = parts_.back();
+        const std::uint32_t next = from.component + 1;
+        if (--from.units == 0) parts_.pop_back();
+        parts_.push_back({next, carry});
         return true;
     }
 
   private:
-    std::vector<std::int32_t> parts_;
-    std::int32_t positive_;
+    std::uint32_t lastComponent_;
+    std::vector<Part> parts_;
 };
+
+/// Type 0 for the composition with all q parts equal, else the number of positive parts.
+std::int32_t typeOf(const std::vector<Part>& parts, std::uint32_t q) {
+    const auto differs = [&parts](const Part& part) { return part.units != parts.front().units; };
+    if (parts.size() == q && std::ranges::none_of(parts, differs)) return des_MixturePointCentroid;
+    return static_cast<std::int32_t>(parts.size());
+}
 
 }  // namespace
 
@@ -81,7 +93,8 @@ void SimplexLatticeDesign::CheckDegree(int& error) {
 }
 
 bool SimplexLatticeDesign::HoldsCentroid() const {
-    return static_cast<std::uint32_t>(degree_) % design_->numComponents == 0;
+    const std::uint32_t q = design_->numComponents;
+    return q != 0 && static_cast<std::uint32_t>(degree_) % q == 0;
 }
 
 void SimplexLatticeDesign::GenerateBaseDesign() {
@@ -101,16 +114,14 @@ void SimplexLatticeDesign::GenerateBaseDesign() {
     std::vector<double> proportionOf(std::size_t{degree} + 1);
     for (std::uint32_t c = 0; c <= degree; ++c)
         proportionOf[c] = c / static_cast<double>(degree);
-    const std::int32_t equalPart = HoldsCentroid() ? degree_ / static_cast<std::int32_t>(q) : 0;
     Compositions compositions(q, degree_);
     do {
-        const std::vector<std::int32_t>& parts = compositions.parts();
-        const bool isCentroid = std::ranges::all_of(parts, [&](std::int32_t part) { return part == equalPart; });
-        const std::int32_t type = isCentroid ? des_MixturePointCentroid : compositions.countPositive();
+        const std::vector<Part>& parts = compositions.parts();
+        const std::int32_t type = typeOf(parts, q);
         if (!IsTypeRun(type)) continue;
         double* const proportions = AppendRun(type).proportions;
-        for (std::uint32_t j = 0; j < q; ++j)
-            proportions[j] = proportionOf[static_cast<std::size_t>(parts[j])];
+        for (const Part& part : parts)
+            proportions[part.component] = proportionOf[static_cast<std::size_t>(part.units)];
     } while (compositions.advance());
 }
 
