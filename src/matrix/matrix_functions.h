@@ -56,8 +56,8 @@ void KTimesColumnPlusColumn(Smatrix<double>& s, double k, int src, int dst, int 
 // The members of the kinds that call the functions above.
 
 template <typename T>
-int matrix<T>::EigenSystems(std::vector<double>& values,
-                            matrix<double>& vectors) const requires std::same_as<T, double> {
+template <std::same_as<double> U>
+int matrix<T>::EigenSystems(std::vector<U>& values, matrix<U>& vectors) const {
     return matrix_library::EigenSystems(*this, values, vectors);
 }
 

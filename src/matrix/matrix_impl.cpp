@@ -1,5 +1,6 @@
 #include "matrix/matrix_functions.h"
 #include "matrix/matrix_new.h"
+#include "matrix/matrix_quadratic_forms.h"
 
 namespace qan::matrix_library {
 

@@ -149,8 +149,14 @@ class matrix {
     Smatrix<T> ConvertToSmatrix() const;
     void mFlattenMatrix(std::vector<T>& out, int start, bool byRows) const;
 
-    // As the free function of matrix_functions.h.
-    int EigenSystems(std::vector<double>& values, matrix<double>& vectors) const requires std::same_as<T, double>;
+    // As the free functions of matrix_functions.h and matrix_quadratic_forms.h, of double only. Templates, so that the
+    // instantiation of matrix<int> passes them over.
+    template <std::same_as<double> U = T>
+    int EigenSystems(std::vector<U>& values, matrix<U>& vectors) const;
+    template <std::same_as<double> U = T>
+    U mQuadraticForm(const std::vector<U>& x) const;
+    template <std::same_as<double> U = T>
+    U mQuadraticForm(const matrix<U>& b, const std::vector<U>& x, const std::vector<U>& y) const;
 
     void CheckInvariant() const { QAN_ALLEGE(signature_ == matrixsignature_); }
 
@@ -363,8 +369,10 @@ class Smatrix {
     void UpdateForFisher(const std::vector<T>& a, const std::vector<T>& b, const std::vector<T>& c, int n);
 
     UTmatrix<T> mSmatrixToUTmatrix() const;
-    // As the free function of matrix_functions.h.
+    // As the free functions of matrix_functions.h and matrix_quadratic_forms.h.
     bool CholeskyDecomp(UTmatrix<T>* factor) const;
+    T mQuadraticForm(const std::vector<T>& x) const;
+    T mQuadraticForm(const matrix<T>& b, const std::vector<T>& x, const std::vector<T>& y) const;
     void mFlattenMatrix(std::vector<T>& out, int start, bool byRows) const;
 
   private:
