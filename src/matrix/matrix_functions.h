@@ -14,8 +14,8 @@ namespace qan::matrix_library {
 
 // The factor U of A = U^T U, for the matrix whose upper triangle is a. Rows above `start` are taken as already
 // factorised. A pivot that is not positive (exactly; no tolerance) ends the work: *failedRow gets its row, *pivot its
-// magnitude, and the columns before it are those of U, the later ones still those of a. On success *failedRow is -1 and
-// *pivot the last pivot. MatrixException when start exceeds the order.
+// magnitude; above it the columns up to its own hold U, and it and the later columns are still those of a. On success
+// *failedRow is -1 and *pivot the last pivot. MatrixException when start exceeds the order.
 UTmatrix<double> CholeskyDecomp(const UTmatrix<double>& a, int start, int* failedRow, double* pivot);
 // False, with an empty result, when a is not positive definite.
 bool CholeskyDecomp(const Smatrix<double>& a, UTmatrix<double>* result);

@@ -1,22 +1,10 @@
 #include "matrix/kernels/factorizations.h"
 
-#include <algorithm>
-#include <cmath>
-#include <cstring>
-#include <utility>
-#include <vector>
+#include "matrix/kernels/level_table.h"
 
 namespace reisti::kernels {
 
 namespace {
-
-// A row or a pivot below this, absolutely or relative to itself with this as the floor, counts as zero.
-constexpr double kZeroFuzz = 4e-12;
-
-bool isZero(double x) {
-    const double magnitude = std::fabs(x);
-    return magnitude < kZeroFuzz || magnitude * kZeroFuzz + kZeroFuzz > magnitude;
-}
 
 // Start of row i in a packed upper triangle, moved back by i so that column j is at [j].
 std::size_t upperRow(std::size_t n, std::size_t i) {
@@ -26,45 +14,7 @@ std::size_t upperRow(std::size_t n, std::size_t i) {
 }  // namespace
 
 bool factorLu(double* a, std::size_t n, int* index, double& parity) {
-    std::fill_n(index, n, 0);
-    parity = 1.0;
-    std::vector<double> scale(n);
-    for (std::size_t i = 0; i < n; ++i) {
-        double greatest = 0.0;
-        for (std::size_t j = 0; j < n; ++j)
-            greatest = std::max(greatest, std::fabs(a[i * n + j]));
-        if (isZero(greatest)) return false;
-        scale[i] = 1.0 / greatest;
-    }
-    for (std::size_t j = 0; j < n; ++j) {
-        double greatest = 0.0;
-        std::size_t pivot = j;
-        for (std::size_t i = 0; i < n; ++i) {
-            double sum = 0.0;
-            for (std::size_t k = 0; k < std::min(i, j); ++k)
-                sum += a[i * n + k] * a[k * n + j];
-            a[i * n + j] -= sum;
-            if (i < j) continue;
-            const double candidate = scale[i] * std::fabs(a[i * n + j]);
-            // Ties go to the later row. A NaN is never chosen, and row j is the choice from the start.
-            if (candidate >= greatest) {
-                greatest = candidate;
-                pivot = i;
-            }
-        }
-        if (pivot != j) {
-            std::swap_ranges(a + pivot * n, a + (pivot + 1) * n, a + j * n);
-            parity = -parity;
-            scale[pivot] = scale[j];
-        }
-        index[j] = static_cast<int>(pivot);
-        if (isZero(a[j * n + j])) return false;
-        if (j + 1 == n) break;
-        const double reciprocal = 1.0 / a[j * n + j];
-        for (std::size_t i = j + 1; i < n; ++i)
-            a[i * n + j] *= reciprocal;
-    }
-    return true;
+    return bestTable().factorLu(a, n, index, parity);
 }
 
 void solveLu(const double* lu, const int* index, std::size_t n, double* b) {
@@ -88,75 +38,19 @@ void solveLu(const double* lu, const int* index, std::size_t n, double* b) {
 }
 
 void solveLuColumns(const double* lu, const int* index, std::size_t n, double* b, std::size_t columns) {
-    std::vector<double> column(n);
-    for (std::size_t j = 0; j < columns; ++j) {
-        for (std::size_t i = 0; i < n; ++i)
-            column[i] = b[i * columns + j];
-        solveLu(lu, index, n, column.data());
-        for (std::size_t i = 0; i < n; ++i)
-            b[i * columns + j] = column[i];
-    }
+    bestTable().solveLuColumns(lu, index, n, b, columns);
 }
 
 void invertLu(const double* lu, const int* index, std::size_t n, double* inverse) {
-    std::fill_n(inverse, n * n, 0.0);
-    for (std::size_t i = 0; i < n; ++i)
-        inverse[i * n + i] = 1.0;
-    solveLuColumns(lu, index, n, inverse, n);
+    bestTable().invertLu(lu, index, n, inverse);
 }
 
 std::ptrdiff_t factorCholesky(double* a, std::size_t n, std::size_t start, double& pivot) {
-    for (std::size_t j = start; j < n; ++j) {
-        double squares = 0.0;
-        for (std::size_t i = 0; i < j; ++i) {
-            double& element = a[upperRow(n, i) + j];
-            if (i >= start) {
-                double sum = 0.0;
-                for (std::size_t k = 0; k < i; ++k)
-                    sum += a[upperRow(n, k) + i] * a[upperRow(n, k) + j];
-                element = (element - sum) / a[upperRow(n, i) + i];
-            }
-            squares += element * element;
-        }
-        double& diagonal = a[upperRow(n, j) + j];
-        pivot = diagonal - squares;
-        if (0.0 >= pivot) {
-            pivot = std::fabs(pivot);
-            return static_cast<std::ptrdiff_t>(j);
-        }
-        diagonal = std::sqrt(pivot);
-    }
-    return -1;
+    return bestTable().factorCholesky(a, n, start, pivot);
 }
 
 void invertCholesky(const double* u, std::size_t n, double* inverse) {
-    // Column j of the factor is row j of the packed lower triangle.
-    const auto column = [inverse](std::size_t j) { return inverse + j * (j + 1) / 2; };
-    for (std::size_t i = 0; i < n; ++i) {
-        for (std::size_t j = i; j < n; ++j)
-            column(j)[i] = *u++;
-    }
-    for (std::size_t j = 0; j < n; ++j) {
-        const double reciprocal = 1.0 / column(j)[j];
-        column(j)[j] = reciprocal;
-        for (std::size_t i = 0; i < j; ++i)
-            column(j)[i] *= -reciprocal;
-        for (std::size_t m = j + 1; m < n; ++m) {
-            const double factor = std::exchange(column(m)[j], 0.0);
-            for (std::size_t i = 0; i <= j; ++i)
-                column(m)[i] += factor * column(j)[i];
-        }
-    }
-    for (std::size_t j = 0; j < n; ++j) {
-        for (std::size_t i = 0; i < j; ++i) {
-            const double factor = column(j)[i];
-            for (std::size_t k = 0; k <= i; ++k)
-                column(i)[k] += factor * column(j)[k];
-        }
-        const double diagonal = column(j)[j];
-        for (std::size_t k = 0; k <= j; ++k)
-            column(j)[k] *= diagonal;
-    }
+    bestTable().invertCholesky(u, n, inverse);
 }
 
 void solveCholesky(const double* u, std::size_t n, double* b) {

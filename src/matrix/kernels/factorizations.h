@@ -26,7 +26,7 @@ void invertLu(const double* lu, const int* index, std::size_t n, double* inverse
 
 // Replaces the packed upper triangle a (row i holds columns i to n - 1) by the factor U of A = U^T U. Rows above start
 // are factorised already. Returns -1 and the last pivot, or, when a pivot is not positive, its row and its magnitude;
-// then only the columns before it are done and the later ones are as they were.
+// then the columns up to its own are done above it, and it and the later columns are as they were.
 std::ptrdiff_t factorCholesky(double* a, std::size_t n, std::size_t start, double& pivot);
 
 // The inverse of U^T U as a packed lower triangle (row i holds columns 0 to i), for the packed upper triangle u. The

@@ -1,5 +1,6 @@
 #include <array>
 #include <cstddef>
+#include <memory>
 #include <utility>
 
 #include "matrix/kernels/level_table.h"

@@ -17,6 +17,13 @@ struct LevelTable {
     Product productLeftTransposed;
     Product productRightTransposed;
     AccumulateProduct accumulateProduct;
+
+    // As in factorizations.h.
+    bool (*factorLu)(double* a, std::size_t n, int* index, double& parity);
+    void (*solveLuColumns)(const double* lu, const int* index, std::size_t n, double* b, std::size_t columns);
+    void (*invertLu)(const double* lu, const int* index, std::size_t n, double* inverse);
+    std::ptrdiff_t (*factorCholesky)(double* a, std::size_t n, std::size_t start, double& pivot);
+    void (*invertCholesky)(const double* u, std::size_t n, double* inverse);
 };
 
 extern const LevelTable kBaselineTable;

@@ -1,9 +1,8 @@
 #include "matrix/kernels/products.h"
 
 #include <gtest/gtest.h>
-#include <string>
 
-#include "matrix/kernels/level_table.h"
+#include "kernel_levels.h"
 #include "support/bit_equality.h"
 #include "support/plain_linear_algebra.h"
 #include "support/random_values.h"
@@ -12,7 +11,6 @@
 namespace reisti::test {
 namespace {
 
-using kernels::Level;
 using kernels::LevelTable;
 
 struct Shape {
@@ -23,15 +21,6 @@ struct Shape {
 
 std::ostream& operator<<(std::ostream& os, const Shape& shape) {
     return os << shape.m << " x " << shape.k << " times " << shape.k << " x " << shape.n;
-}
-
-using Draw = double (RandomValues::*)();
-
-PlainMatrix randomMatrix(RandomValues& random, std::size_t rows, std::size_t cols, Draw draw) {
-    PlainMatrix a(rows, cols);
-    for (double& value : a.values)
-        value = (random.*draw)();
-    return a;
 }
 
 /// All three products of one level against the plain loops. The results are computed over garbage, which must not show.
@@ -51,13 +40,7 @@ void expectPlainProducts(const LevelTable& table, RandomValues& random, Shape sh
     EXPECT_TRUE(haveSameBits(c, expected.values)) << "right transposed, " << shape;
 }
 
-class ProductKernels : public testing::TestWithParam<Level> {
-  protected:
-    void SetUp() override {
-        if (!kernels::isAvailable(GetParam())) GTEST_SKIP() << "this processor lacks " << kernels::name(GetParam());
-    }
-    const LevelTable& table() const { return kernels::tableOf(GetParam()); }
-};
+class ProductKernels : public KernelLevels {};
 
 TEST_P(ProductKernels, MatchPlainLoopsForAllSmallShapes) {
     RandomValues random(1);
@@ -113,8 +96,7 @@ TEST_P(ProductKernels, KeepTheSignOfZero) {
     }
 }
 
-INSTANTIATE_TEST_SUITE_P(Levels, ProductKernels, testing::ValuesIn(kernels::kLevels),
-                         [](const auto& instance) { return std::string(kernels::name(instance.param)); });
+INSTANTIATE_TEST_SUITE_P(Levels, ProductKernels, testing::ValuesIn(kernels::kLevels), levelName);
 
 TEST(BestLevel, IsAvailable) {
     EXPECT_TRUE(kernels::isAvailable(kernels::bestLevel()));
