@@ -6,6 +6,7 @@
 #include "matrix/matrix_checks.h"
 #include "matrix/matrix_columns.h"
 #include "matrix/matrix_exceptions.h"
+#include "matrix/matrix_expression.h"
 #include "matrix/matrix_functions.h"
 #include "matrix/matrix_ludecomposition.h"
 #include "matrix/matrix_new.h"
