@@ -86,9 +86,10 @@ PlainBounds plainBounds(std::vector<double> lower, std::vector<double> upper, do
 std::uint32_t plainBinomial(std::uint32_t n, std::uint32_t k) {
     std::vector<std::uint32_t> row(k + 1, 0);
     row[0] = 1;
-    for (std::uint32_t i = 1; i <= n; ++i)
+    for (std::uint32_t i = 1; i <= n; ++i) {
         for (std::uint32_t j = k; j > 0; --j)
             row[j] += row[j - 1];
+    }
     return row[k];
 }
 

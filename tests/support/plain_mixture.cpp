@@ -66,11 +66,14 @@ std::vector<PlainPoint> replicated(const MixtureRequest& request, const std::vec
     std::iota(classes.begin(), classes.end(), 1);
     classes.push_back(0);
     classes.push_back(-1);
-    for (const std::int32_t pointType : classes)
-        for (const auto& point : distinct)
-            if (point.pointType == pointType)
+    for (const std::int32_t pointType : classes) {
+        for (const auto& point : distinct) {
+            if (point.pointType == pointType) {
                 for (std::uint32_t copy = 1; copy < replicatesOf(request, pointType); ++copy)
                     points.push_back(point);
+            }
+        }
+    }
     std::vector<PlainPoint> blocks;
     for (std::uint32_t block = 0; block < request.designReplicates; ++block)
         blocks.insert(blocks.end(), points.begin(), points.end());
@@ -85,9 +88,10 @@ std::vector<MixtureRunValue> withAmounts(const MixtureRequest& request, const st
     std::vector<double> amounts = request.amounts;
     if (amounts.empty()) amounts.push_back(1.0);
     std::vector<MixtureRunValue> runs;
-    for (const double amount : amounts)
+    for (const double amount : amounts) {
         for (const auto& point : points)
             runs.push_back(runAt(runs.size(), point, amount));
+    }
     return runs;
 }
 
@@ -211,18 +215,20 @@ testing::AssertionResult sameRun(const MixtureRunValue& actual, const MixtureRun
         return testing::AssertionFailure() << "point type " << actual.pointType << " not " << expected.pointType;
     if (!sameNumber(actual.amount, expected.amount))
         return testing::AssertionFailure() << "amount " << actual.amount << " not " << expected.amount;
-    if (actual.processLevels != expected.processLevels)
+    if (actual.processLevels != expected.processLevels) {
         return testing::AssertionFailure() << "process levels " << testing::PrintToString(actual.processLevels)
                                            << " not " << testing::PrintToString(expected.processLevels);
+    }
     return sameBits(actual.proportions, expected.proportions);
 }
 
 testing::AssertionResult sameRuns(const MixtureOutcome& actual, const MixtureOutcome& expected) {
     if (actual.runs.size() != expected.runs.size())
         return testing::AssertionFailure() << actual.runs.size() << " runs, not " << expected.runs.size();
-    for (std::size_t i = 0; i < actual.runs.size(); ++i)
+    for (std::size_t i = 0; i < actual.runs.size(); ++i) {
         if (const auto same = sameRun(actual.runs[i], expected.runs[i]); !same)
             return testing::AssertionFailure() << "run " << i << ": " << same.message();
+    }
     return testing::AssertionSuccess();
 }
 
@@ -269,9 +275,10 @@ testing::AssertionResult sameOutcome(const MixtureOutcome& actual, const Mixture
                                                      {"scaledUpperBounds", &MixtureOutcome::scaledUpperBounds},
                                                      {"pseudoLowerBounds", &MixtureOutcome::pseudoLowerBounds},
                                                      {"pseudoUpperBounds", &MixtureOutcome::pseudoUpperBounds}};
-    for (const auto& [name, member] : bounds)
+    for (const auto& [name, member] : bounds) {
         if (const auto same = sameBits(actual.*member, expected.*member); !same)
             return testing::AssertionFailure() << name << ": " << same.message();
+    }
     return sameRuns(actual, expected);
 }
 

@@ -19,9 +19,10 @@ std::vector<double> randomParts(Random& random, std::uint32_t count, double sum)
     for (double& part : parts)
         part = below(random, 3) == 0 ? 0.0 : between(random, 0.0, 1.0);
     const double whole = std::accumulate(parts.begin(), parts.end(), 0.0);
-    if (whole > 0.0)
+    if (whole > 0.0) {
         for (double& part : parts)
             part *= sum / whole;
+    }
     return parts;
 }
 

@@ -199,9 +199,10 @@ TEST_P(TwoLevelFraction, HasTheNamedProductsAsAddedColumns) {
 TEST_P(TwoLevelFraction, TogetherWithTheOthersIsTheFullFactorial) {
     std::map<std::vector<std::int32_t>, int> times;
     const auto fractions = static_cast<std::uint32_t>(golden_.integer("processFraction"));
-    for (std::uint32_t index = 1; index <= fractions; ++index)
+    for (std::uint32_t index = 1; index <= fractions; ++index) {
         for (const auto& levels : settingsWithIndex(index))
             ++times[levels];
+    }
     EXPECT_EQ(times.size(), std::size_t{1} << golden_.integer("numProcessVariables"));
     for (const auto& [levels, count] : times)
         EXPECT_EQ(count, 1) << testing::PrintToString(levels);

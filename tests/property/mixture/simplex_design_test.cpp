@@ -88,10 +88,12 @@ TEST(RandomDesigns, PseudoComponentsAreFoundAgainFromTheProportions) {
         ASSERT_EQ(pseudo.runs.size(), actual.runs.size());
         const auto& lower = actual.scaledLowerBounds;
         const double room = 1.0 - std::accumulate(lower.begin(), lower.end(), 0.0);
-        for (std::size_t run = 0; run < actual.runs.size(); ++run)
-            for (std::size_t j = 0; j < lower.size(); ++j)
+        for (std::size_t run = 0; run < actual.runs.size(); ++run) {
+            for (std::size_t j = 0; j < lower.size(); ++j) {
                 EXPECT_NEAR((actual.runs[run].proportions[j] - lower[j]) / room, pseudo.runs[run].proportions[j],
                             kRelativeToTotal / room);
+            }
+        }
     }
 }
 
@@ -126,9 +128,10 @@ std::uint64_t statedRuns(const MixtureRequest& request, const MixtureOutcome& de
     std::uint64_t runs = std::uint64_t{design.numCenterPoints} * request.centerReplicates +
                          std::uint64_t{design.numAxialPoints} * request.axialReplicates +
                          std::uint64_t{design.pointsPerType[0]} * request.vertexReplicates;
-    for (std::uint32_t type = 2; type <= q; ++type)
+    for (std::uint32_t type = 2; type <= q; ++type) {
         runs += std::uint64_t{design.pointsPerType[type - 1]} *
                 (type < q && request.typeReplicates ? request.typeReplicates->at(type - 2) : 1);
+    }
     return runs * request.designReplicates * std::max<std::size_t>(request.amounts.size(), 1) *
            ((std::uint64_t{1} << request.numProcessVariables) / request.processFraction);
 }

@@ -152,9 +152,10 @@ INSTANTIATE_TEST_SUITE_P(All, CatalogEntry, testing::ValuesIn(catalogTable()),
 TEST(Catalog, HasFortyNineEntries) {
     const FFDesignCatalog catalog;
     int hits = 0;
-    for (int factors = 0; factors <= 40; ++factors)
+    for (int factors = 0; factors <= 40; ++factors) {
         for (int runs = 0; runs <= 1100; ++runs)
             hits += catalog.GetFFCatalogDesign(factors, runs).numRuns != 0;
+    }
     EXPECT_EQ(hits, 49);
     EXPECT_EQ(catalogTable().size(), 49U);
 }

@@ -60,6 +60,29 @@ TEST_P(AllocationFailure, OfAnyAllocationIsReportedAndLeavesNothing) {
     }
 }
 
+TEST_P(AllocationFailure, LeavesRunsUntouchedBeforeTheyAreCountedAndNullAfterwards) {
+    bool counted = false;
+    for (std::size_t n = 1;; ++n) {
+        ASSERT_LT(n, 100000U);
+        SCOPED_TRACE(n);
+        MixtureRecord record(GetParam().request);
+        des_MixtureRun theirs{};
+        record->runs = &theirs;
+        record->numRuns = 77;
+        AllocationWatch watch(n);
+        record.run();
+        watch.stop();
+        if (!watch.counts().failed) break;
+        const bool untouched = record->runs == &theirs && record->numRuns == 77;
+        const bool cleared = record->runs == nullptr && record->numRuns == 0;
+        EXPECT_TRUE(cleared || (untouched && !counted));
+        counted = cleared;
+        record->runs = nullptr;
+        record->numRuns = 0;
+    }
+    EXPECT_TRUE(counted);
+}
+
 TEST_P(AllocationFailure, UndisturbedRunKeepsTheRunsAndNothingElse) {
     MixtureRecord record(GetParam().request);
     AllocationWatch watch;

@@ -89,6 +89,11 @@ TEST(SeveralAmounts, MayContainZero) {
     EXPECT_THAT(design.runs[7].proportions, Each(0.0));
 }
 
+TEST(SeveralAmounts, BehindTheFirstAreTakenAsTheyAre) {
+    expectPlain(boundedWithTotals({10, -5}, des_UnitsAmount));
+    expectPlain(boundedWithTotals({10, 1e300}, des_UnitsAmount));
+}
+
 TEST(SeveralAmounts, WithProcessVariablesAreRefused) {
     MixtureRequest request = withTotals({10, 20}, des_UnitsAmount);
     request.numProcessVariables = 1;

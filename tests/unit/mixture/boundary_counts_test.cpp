@@ -27,9 +27,10 @@ SubsetSumCounts countsOf(double rStar, const std::vector<double>& ranges) {
 /// C(i+1, j+1) in row i and column j.
 qan::matrix_library::matrix<int> plainBinomialTable(std::uint32_t q) {
     qan::matrix_library::matrix<int> binomials(static_cast<int>(q), static_cast<int>(q), 0);
-    for (std::uint32_t i = 0; i < q; ++i)
+    for (std::uint32_t i = 0; i < q; ++i) {
         for (std::uint32_t j = 0; j <= i; ++j)
             binomials(static_cast<int>(i), static_cast<int>(j)) = static_cast<int>(plainBinomial(i + 1, j + 1));
+    }
     return binomials;
 }
 
@@ -52,10 +53,12 @@ SubsetSumCounts countsOfWholeRanges(std::uint32_t rStar, const std::vector<std::
     const std::size_t q = ranges.size();
     std::vector<std::vector<std::uint32_t>> ways(q + 1, std::vector<std::uint32_t>(largest + 1, 0));
     ways[0][0] = 1;
-    for (const std::uint32_t range : ranges)
-        for (std::size_t size = q; size > 0; --size)
+    for (const std::uint32_t range : ranges) {
+        for (std::size_t size = q; size > 0; --size) {
             for (std::size_t sum = range; sum <= largest; ++sum)
                 ways[size][sum] += ways[size - 1][sum - range];
+        }
+    }
     SubsetSumCounts counts{std::vector<std::uint32_t>(q, 0), std::vector<std::uint32_t>(q, 0)};
     for (std::size_t size = 1; size <= q; ++size) {
         for (std::uint32_t sum = 0; sum < rStar; ++sum)
@@ -194,13 +197,55 @@ TEST_P(WholeRanges, FewDifferentOnesAreCountedRight) {
 INSTANTIATE_TEST_SUITE_P(Components, WholeRanges, testing::Values(19, 20, 25, 30, 33, 36, 40),
                          testing::PrintToStringParamName());
 
+/// Subsets of `size` whole ranges whose sum is below rStar, and equal to it, by visiting them.
+std::pair<std::uint32_t, std::uint32_t> visitSubsets(const std::vector<std::uint32_t>& ranges, std::uint64_t rStar,
+                                                     std::size_t first, std::uint32_t size, std::uint64_t sum) {
+    if (size == 0) return {sum < rStar, sum == rStar};
+    std::pair<std::uint32_t, std::uint32_t> counts{0, 0};
+    for (std::size_t i = first; i + size <= ranges.size(); ++i) {
+        const auto [below, equal] = visitSubsets(ranges, rStar, i + 1, size - 1, sum + ranges[i]);
+        counts.first += below;
+        counts.second += equal;
+    }
+    return counts;
+}
+
+/// Forty ranges whose subset sums are nearly all different: nothing can be merged. Leaving a subset out instead of
+/// taking it turns every count into one for the rest of the sum.
+TEST(SubsetSums, OfFortyRangesWithoutTiesAreSymmetricAndRightForSmallSubsets) {
+    std::mt19937_64 random(4040);
+    constexpr double kUnit = 1 << 20;
+    std::vector<std::uint32_t> whole(40);
+    std::uint64_t total = 0;
+    for (std::uint32_t& range : whole)
+        total += range = static_cast<std::uint32_t>(1 + random() % (1 << 20));
+    std::vector<double> ranges;
+    for (const std::uint32_t range : whole)
+        ranges.push_back(range / kUnit);
+    const std::uint64_t rStar = total / 2 + whole[0] / 4;
+    const auto counts = countsOf(static_cast<double>(rStar) / kUnit, ranges);
+    const auto rest = countsOf(static_cast<double>(total - rStar) / kUnit, ranges);
+    for (std::uint32_t k = 1; k < 40; ++k) {
+        EXPECT_EQ(counts.below[k - 1] + counts.equal[k - 1] + rest.below[40 - k - 1], plainBinomial(40, k)) << k;
+        EXPECT_EQ(counts.equal[k - 1], rest.equal[40 - k - 1]) << k;
+    }
+    const std::uint64_t few = total / 10;
+    const auto small = countsOf(static_cast<double>(few) / kUnit, ranges);
+    for (std::uint32_t k = 1; k <= 5; ++k) {
+        const auto [below, equal] = visitSubsets(whole, few, 0, k, 0);
+        EXPECT_EQ(small.below[k - 1], below) << k;
+        EXPECT_EQ(small.equal[k - 1], equal) << k;
+    }
+}
+
 TEST(BinomialTable, HoldsTheBinomialCoefficientsAndZerosAboveTheDiagonal) {
     for (const std::uint32_t q : {2U, 3U, 10U, 33U, 34U, 40U, 70U}) {
         const auto table = binomialTable(q);
         const auto plain = plainBinomialTable(q);
-        for (int i = 0; i < static_cast<int>(q); ++i)
+        for (int i = 0; i < static_cast<int>(q); ++i) {
             for (int j = 0; j < static_cast<int>(q); ++j)
                 EXPECT_EQ(table(i, j), plain(i, j)) << i << ", " << j;
+        }
     }
 }
 
@@ -237,9 +282,10 @@ INSTANTIATE_TEST_SUITE_P(Components, SimplexFaces, testing::Values(2, 3, 4, 5, 1
 
 /// Vertices of the hypersimplex: ranges of 1/k each leave the mixtures whose vertices have k equal components.
 TEST(Boundaries, OfHypersimplicesHaveAVertexForEachSubset) {
-    for (const std::uint32_t q : {6U, 12U, 20U, 26U})
+    for (const std::uint32_t q : {6U, 12U, 20U, 26U}) {
         for (std::uint32_t k = 2; k < q; ++k)
             EXPECT_EQ(facesOf(1.0, std::vector<double>(q, 1.0 / k))[0], plainBinomial(q, k)) << q << ", " << k;
+    }
 }
 
 TEST(Boundaries, VertexCountBeyondThirtyTwoBitsWraps) {

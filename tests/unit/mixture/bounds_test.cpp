@@ -144,6 +144,7 @@ const std::vector<RefusedCase> REFUSED = {
     {"UpperSumComesBeforeASingleUpperBound", bounded({0, 0, 0}, {1.5, -0.5, -0.5}), des_ErrorUpperBoundSum},
     {"UpperSumIsInfinite", bounded({0, 0, 0}, {1, kInfinity, 1}), des_ErrorUpperBoundSum},
     {"UpperSumOfANegativeTotal", bounded({0, 0, 0}, {1, 1, 1}, {-1}), des_ErrorUpperBoundSum},
+    {"UpperSumOfAnInfiniteTotal", bounded({0, 0, 0}, {1, 1, 1}, {kInfinity}), des_ErrorUpperBoundSum},
     {"UpperSumOfOneComponent", bounded({0}, {1}), des_ErrorUpperBoundSum},
     {"UpperSumOfNoComponents", bounded({}, {}), des_ErrorUpperBoundSum},
     {"UpperBoundIsAboveOne", bounded({0, 0, 0}, {1.5, 1, 1}), des_ErrorUpperBound},
