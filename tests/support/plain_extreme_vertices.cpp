@@ -85,6 +85,7 @@ void addPointOnEdge(PlainRegion& region, std::size_t a, std::size_t b, std::size
     std::vector<double> slack;
     for (const std::vector<double>& plane : region.planes)
         slack.push_back(valueOfPlane(plane, x));
+    if (region.points.size() >= region.patience) throw OutOfPatience();
     region.points.push_back(x);
     region.slack.push_back(slack);
 }

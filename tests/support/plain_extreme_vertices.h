@@ -2,6 +2,7 @@
 #define REISTI_TESTS_SUPPORT_PLAIN_EXTREME_VERTICES_H
 
 #include <cstddef>
+#include <exception>
 #include <vector>
 
 // The enumeration of vertices and face centroids in its plainest form: a table of all combinations of bounds, every
@@ -29,10 +30,15 @@ struct PlainRegion {
     std::vector<PlainConstraint> constraints;
     double total = 1.0;
     bool boundsChanged = false;
-    Table points;  ///< one row per vertex
-    Table planes;  ///< one row per plane: coefficients, then the constant
-    Table slack;   ///< one row per vertex, one column per plane
+    Table points;                                         ///< one row per vertex
+    Table planes;                                         ///< one row per plane: coefficients, then the constant
+    Table slack;                                          ///< one row per vertex, one column per plane
+    std::size_t patience = static_cast<std::size_t>(-1);  ///< most vertices before the enumeration gives up
 };
+
+/// Thrown when a region has more vertices than its patience. Where a range nearly vanishes, both its planes count as
+/// common to all vertices, every pair of vertices passes for an edge, and each cut can square their number.
+struct OutOfPatience : std::exception {};
 
 /// List of components (0-based) by ascending range; the last one is free.
 std::vector<std::size_t> plainComponentOrder(const std::vector<double>& lower, const std::vector<double>& upper);

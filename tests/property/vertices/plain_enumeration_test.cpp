@@ -1,0 +1,136 @@
+// The library's vertices and centroids against the plain enumeration: every bit, every row in its place.
+#include <cstddef>
+#include <cstdint>
+#include <gtest/gtest.h>
+#include <string>
+#include <vector>
+
+#include "support/plain_extreme_vertices.h"
+#include "support/random_regions.h"
+#include "support/scale.h"
+#include "support/vertex_engine.h"
+
+namespace reisti::test {
+namespace {
+
+constexpr int kNoLimit = 2147483647;
+
+PlainRegion randomRegion(RegionMaker& maker, std::size_t q, std::size_t maxConstraints) {
+    PlainRegion region;
+    region.patience = 400;
+    const double totals[] = {1.0, 1.0, 1.0, 2.0, 100.0, 0.3};
+    region.total = totals[maker.below(6)];
+    maker.bounds(q, region.lower, region.upper);
+    const std::size_t constraints = maker.below(maxConstraints + 1);
+    for (std::size_t c = 0; c < constraints; ++c)
+        region.constraints.push_back(maker.constraint(region.lower, region.upper, region.total, region.constraints));
+    return region;
+}
+
+std::string describe(const PlainRegion& region) {
+    return describe(region.lower, region.upper, region.constraints, region.total);
+}
+
+// Compares the enumeration, then the centroids of a degree, then limits met exactly and missed.
+void expectPlain(const PlainRegion& region, const EnumeratedRegion& expected, int degree) {
+    ASSERT_TRUE(sameEnumeration(enumerated(region), expected)) << describe(region);
+    if (expected.points.empty()) return;
+
+    const int q = static_cast<int>(region.lower.size());
+    const auto plain = [&](int limit) {
+        return plainFaceCentroids(expected.points, expected.slack, expected.numPlanes, q, degree, limit);
+    };
+    const auto found = [&](int limit) {
+        return faceCentroids(expected.points, expected.slack, expected.numPlanes, q, degree, limit);
+    };
+    const PlainCentroids all = plain(kNoLimit);
+    ASSERT_TRUE(sameCentroids(found(kNoLimit), all)) << describe(region) << "\n degree " << degree;
+    const int numPoints = static_cast<int>(all.points.size());
+    ASSERT_TRUE(sameCentroids(found(numPoints), all)) << describe(region) << "\n degree " << degree << ", limit met";
+    const int inTheMiddle = numPoints - all.count / 2;
+    for (const int limit : {numPoints - 1, inTheMiddle}) {
+        ASSERT_TRUE(sameCentroids(found(limit), plain(limit)))
+            << describe(region) << "\n degree " << degree << ", limit " << limit;
+    }
+}
+
+struct Series {
+    const char* name;
+    std::size_t q;
+    int regions;
+    std::size_t maxConstraints;
+};
+
+void PrintTo(const Series& series, std::ostream* out) {
+    *out << series.name;
+}
+
+class PlainEnumeration : public testing::TestWithParam<Series> {};
+
+TEST_P(PlainEnumeration, IsMetToTheLastBit) {
+    const Series& series = GetParam();
+    RegionMaker maker(1000 + series.q * 10 + series.maxConstraints);
+    const int regions = scaled(series.regions);
+    int compared = 0;
+    for (int i = 0; i < regions && !HasFailure(); ++i) {
+        const PlainRegion region = randomRegion(maker, series.q, series.maxConstraints);
+        // Mostly the full degree, which holds all others.
+        const int degree = static_cast<int>(maker.oneIn(4) ? maker.below(series.q + 1) : series.q);
+        try {
+            expectPlain(region, plainlyEnumerated(region), degree);
+            ++compared;
+        } catch (const OutOfPatience&) {
+            // The library would need as long.
+        }
+    }
+    EXPECT_GE(compared, regions * 95 / 100);
+}
+
+INSTANTIATE_TEST_SUITE_P(Sizes, PlainEnumeration,
+                         testing::Values(Series{"TwoComponents", 2, 2000, 3}, Series{"ThreeComponents", 3, 12000, 4},
+                                         Series{"FourComponents", 4, 12000, 4}, Series{"FiveComponents", 5, 5000, 4},
+                                         Series{"SixComponents", 6, 1000, 4}, Series{"SevenComponents", 7, 120, 4},
+                                         Series{"FourComponentsManyConstraints", 4, 600, 24},
+                                         Series{"SixComponentsManyConstraints", 6, 100, 10}),
+                         [](const testing::TestParamInfo<Series>& info) { return info.param.name; });
+
+class PlainBoundVertices : public testing::TestWithParam<std::size_t> {};
+
+TEST_P(PlainBoundVertices, OfManyComponentsAreMetToTheLastBit) {
+    const std::size_t q = GetParam();
+    RegionMaker maker(2000 + q);
+    const int regions = scaled(q <= 10 ? 200 : q <= 12 ? 40 : 10);
+    for (int i = 0; i < regions && !HasFailure(); ++i) {
+        PlainRegion region;
+        if (q <= 10 && maker.oneIn(2)) {
+            maker.bounds(q, region.lower, region.upper);
+        } else {
+            maker.typicalBounds(q, region.lower, region.upper);
+        }
+        ASSERT_TRUE(sameEnumeration(enumerated(region), plainlyEnumerated(region))) << describe(region);
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(Components, PlainBoundVertices, testing::Values(8, 9, 10, 11, 12, 13, 14),
+                         testing::PrintToStringParamName());
+
+TEST(PlainBoundVerticesAtTheDensest, OfNominalRangesAreMetToTheLastBit) {
+    RegionMaker maker(7);
+    for (const std::size_t q : {6U, 8U, 10U, 11U}) {
+        PlainRegion region;
+        maker.nominalBounds(q, 0.2, region.lower, region.upper);
+        ASSERT_TRUE(sameEnumeration(enumerated(region), plainlyEnumerated(region))) << describe(region);
+    }
+}
+
+TEST(PlainEdges, OfNineComponentsAreMetToTheLastBit) {
+    RegionMaker maker(8);
+    PlainRegion region;
+    maker.typicalBounds(9, region.lower, region.upper);
+    const EnumeratedRegion all = enumerated(region);
+    const auto expected = plainFaceCentroids(all.points, all.slack, all.numPlanes, 9, 2, kNoLimit);
+    EXPECT_TRUE(sameCentroids(faceCentroids(all.points, all.slack, all.numPlanes, 9, 2, kNoLimit), expected));
+}
+
+}  // namespace
+}  // namespace reisti::test
