@@ -24,7 +24,7 @@ double subsetSum(const std::vector<double>& ranges, std::uint32_t mask) {
 }
 
 /// One component's test and tightening; false when it is refused.
-bool tightenComponent(PlainBounds& bounds, std::size_t i, double room, double excess) {
+bool tightenComponent(PlainBounds& bounds, std::size_t i, double room, double excess, bool requireSimplex) {
     const double lower = bounds.lower[i];
     const double upper = bounds.upper[i];
     const double range = upper - lower;
@@ -32,7 +32,7 @@ bool tightenComponent(PlainBounds& bounds, std::size_t i, double room, double ex
         bounds.code = des_ErrorUpperBound;
     } else if (range <= upper * 1e-5) {
         bounds.code = des_ErrorEmptyRange;
-    } else if (bounds.lower.size() > 2 && plainCompare(room + range, excess, 0.0) == 1) {
+    } else if (requireSimplex && bounds.lower.size() > 2 && plainCompare(room + range, excess, 0.0) == 1) {
         bounds.code = des_ErrorNotSimplex;
     }
     if (bounds.code != des_Success) return false;
@@ -45,7 +45,8 @@ bool tightenComponent(PlainBounds& bounds, std::size_t i, double room, double ex
         bounds.adjusted = true;
     }
     const double reference = bounds.upper[0] - bounds.lower[0];
-    if (plainCompare(bounds.upper[i] - bounds.lower[i], reference, 1.0) != 0) bounds.code = des_ErrorNotSimplex;
+    if (requireSimplex && plainCompare(bounds.upper[i] - bounds.lower[i], reference, 1.0) != 0)
+        bounds.code = des_ErrorNotSimplex;
     return bounds.code == des_Success;
 }
 
@@ -58,7 +59,7 @@ int plainCompare(double a, double b, double scale) {
     return b > a ? -1 : 1;
 }
 
-PlainBounds plainBounds(std::vector<double> lower, std::vector<double> upper, double total) {
+PlainBounds plainBounds(std::vector<double> lower, std::vector<double> upper, double total, bool requireSimplex) {
     PlainBounds bounds;
     for (double& bound : lower)
         bound /= total;
@@ -77,8 +78,8 @@ PlainBounds plainBounds(std::vector<double> lower, std::vector<double> upper, do
         return bounds;
     }
     for (std::size_t i = 0; i < lower.size(); ++i)
-        if (!tightenComponent(bounds, i, 1.0 - lowerSum, upperSum - 1.0)) return bounds;
-    if (plainCompare(bounds.upper[0] - bounds.lower[0], 1.0 - sum(bounds.lower), 1.0) != 0)
+        if (!tightenComponent(bounds, i, 1.0 - lowerSum, upperSum - 1.0, requireSimplex)) return bounds;
+    if (requireSimplex && plainCompare(bounds.upper[0] - bounds.lower[0], 1.0 - sum(bounds.lower), 1.0) != 0)
         bounds.code = des_ErrorNotSimplex;
     return bounds;
 }

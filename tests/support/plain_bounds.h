@@ -19,7 +19,8 @@ struct PlainBounds {
 };
 
 /// Divides the bounds by the total and tightens them; stops at the first violation with the bounds as they are then.
-PlainBounds plainBounds(std::vector<double> lower, std::vector<double> upper, double total);
+/// @param requireSimplex whether the bounds have to leave a simplex
+PlainBounds plainBounds(std::vector<double> lower, std::vector<double> upper, double total, bool requireSimplex = true);
 
 /// C(n, k) modulo 2^32.
 std::uint32_t plainBinomial(std::uint32_t n, std::uint32_t k);

@@ -43,20 +43,6 @@ std::vector<PlainPoint> distinctPoints(const MixtureRequest& request) {
     return points;
 }
 
-void countPoints(const std::vector<PlainPoint>& points, MixtureOutcome& outcome) {
-    std::fill(outcome.pointsPerType.begin(), outcome.pointsPerType.end(), 0);
-    outcome.numCenterPoints = outcome.numAxialPoints = 0;
-    for (const auto& point : points) {
-        if (point.pointType == 0) {
-            ++outcome.numCenterPoints;
-        } else if (point.pointType == -1) {
-            ++outcome.numAxialPoints;
-        } else {
-            ++outcome.pointsPerType.at(static_cast<std::size_t>(point.pointType) - 1);
-        }
-    }
-}
-
 /// The distinct points that are run at all, then the further replicates class by class, then the further blocks.
 std::vector<PlainPoint> replicated(const MixtureRequest& request, const std::vector<PlainPoint>& distinct) {
     std::vector<PlainPoint> points;
@@ -131,14 +117,40 @@ void rescale(const MixtureRequest& request, MixtureOutcome& outcome) {
             }
         }
     }
-    if (request.amounts.empty()) return;
-    for (double& bound : outcome.lowerBounds)
-        bound = bound * request.amounts[0];
-    for (double& bound : outcome.upperBounds)
-        bound = bound * request.amounts[0];
 }
 
-void randomize(const MixtureRequest& request, std::vector<MixtureRunValue>& runs) {
+}  // namespace
+
+std::int32_t plainRefusal(const MixtureRequest& request) {
+    const std::uint32_t p = request.numProcessVariables;
+    if (request.amounts.size() >= 2 && p >= 1) return des_ErrorAmountsAndProcess;
+    if (p == 0) return des_Success;
+    const bool noSettings =
+        request.processFraction == 0 || request.processFraction > std::ldexp(1.0, static_cast<int>(p));
+    return noSettings || !plainFractionAllowed(p, request.processFraction) ? des_ErrorProcessFraction : des_Success;
+}
+
+void plainCountPoints(const std::vector<PlainPoint>& points, MixtureOutcome& outcome) {
+    std::fill(outcome.pointsPerType.begin(), outcome.pointsPerType.end(), 0);
+    outcome.numCenterPoints = outcome.numAxialPoints = 0;
+    for (const auto& point : points) {
+        if (point.pointType == 0) {
+            ++outcome.numCenterPoints;
+        } else if (point.pointType == -1) {
+            ++outcome.numAxialPoints;
+        } else {
+            ++outcome.pointsPerType.at(static_cast<std::size_t>(point.pointType) - 1);
+        }
+    }
+}
+
+bool plainRunsOf(const MixtureRequest& request, const std::vector<PlainPoint>& distinct,
+                 std::vector<MixtureRunValue>& runs) {
+    runs = withAmounts(request, replicated(request, distinct));
+    return crossWithSettings(request, runs);
+}
+
+void plainRandomize(const MixtureRequest& request, std::vector<MixtureRunValue>& runs) {
     if (request.randomize == 0) return;
     std::vector<double> keys;
     generateRandomNumbers(static_cast<std::uint32_t>(runs.size()), request.seed, keys);
@@ -149,7 +161,15 @@ void randomize(const MixtureRequest& request, std::vector<MixtureRunValue>& runs
         runs[order[k]].runOrder = static_cast<std::uint32_t>(k + 1);
 }
 
-void reportBounds(const MixtureRequest& request, MixtureOutcome& outcome) {
+void plainRestoreBounds(const MixtureRequest& request, MixtureOutcome& outcome) {
+    if (request.amounts.empty()) return;
+    for (double& bound : outcome.lowerBounds)
+        bound = bound * request.amounts[0];
+    for (double& bound : outcome.upperBounds)
+        bound = bound * request.amounts[0];
+}
+
+void plainReportBounds(const MixtureRequest& request, MixtureOutcome& outcome) {
     const double total = request.amounts.empty() ? 1.0 : request.amounts[0];
     const double lowerSum = sum(outcome.lowerBounds);
     for (std::size_t i = 0; i < outcome.lowerBounds.size(); ++i) {
@@ -161,23 +181,11 @@ void reportBounds(const MixtureRequest& request, MixtureOutcome& outcome) {
     }
 }
 
-/// What is refused before the bounds are looked at.
-std::int32_t refusal(const MixtureRequest& request) {
-    const std::uint32_t p = request.numProcessVariables;
-    if (request.lattice && (request.degree < 1 || request.degree > plainDegreeLimit(request.numComponents())))
-        return des_ErrorDegree;
-    if (request.amounts.size() >= 2 && p >= 1) return des_ErrorAmountsAndProcess;
-    if (p == 0) return des_Success;
-    const bool noSettings =
-        request.processFraction == 0 || request.processFraction > std::ldexp(1.0, static_cast<int>(p));
-    return noSettings || !plainFractionAllowed(p, request.processFraction) ? des_ErrorProcessFraction : des_Success;
-}
-
-}  // namespace
-
 MixtureOutcome plainDesign(const MixtureRequest& request) {
     MixtureOutcome outcome = MixtureOutcome::untouched(request);
-    outcome.code = refusal(request);
+    const bool degreeAllowed =
+        !request.lattice || (request.degree >= 1 && request.degree <= plainDegreeLimit(request.numComponents()));
+    outcome.code = degreeAllowed ? plainRefusal(request) : std::int32_t{des_ErrorDegree};
     if (outcome.code != des_Success) return outcome;
 
     const PlainBounds bounds =
@@ -189,16 +197,16 @@ MixtureOutcome plainDesign(const MixtureRequest& request) {
     if (outcome.code != des_Success) return outcome;
 
     const auto distinct = distinctPoints(request);
-    outcome.runs = withAmounts(request, replicated(request, distinct));
-    if (!crossWithSettings(request, outcome.runs)) {
+    if (!plainRunsOf(request, distinct, outcome.runs)) {
         outcome.code = des_ErrorProcessFraction;
         return outcome;
     }
     outcome.boundaryCounts = plainBoundaryCounts(outcome.lowerBounds, outcome.upperBounds);
     rescale(request, outcome);
-    randomize(request, outcome.runs);
-    reportBounds(request, outcome);
-    countPoints(distinct, outcome);
+    plainRestoreBounds(request, outcome);
+    plainRandomize(request, outcome.runs);
+    plainReportBounds(request, outcome);
+    plainCountPoints(distinct, outcome);
     return outcome;
 }
 

@@ -6,25 +6,12 @@
 #include <vector>
 
 #include "support/vertex_engine.h"
+#include "support/vertices_request.h"
 
 namespace reisti::test {
 namespace {
 
 constexpr double kInfinity = std::numeric_limits<double>::infinity();
-constexpr int kStatusBefore = 77;
-
-PlainConstraint atLeast(double value, std::vector<double> coefficients) {
-    return {true, value, false, 0.0, std::move(coefficients), kStatusBefore};
-}
-
-PlainConstraint atMost(double value, std::vector<double> coefficients) {
-    return {false, 0.0, true, value, std::move(coefficients), kStatusBefore};
-}
-
-PlainConstraint between(double low, double high, std::vector<double> coefficients) {
-    return {true, low, true, high, std::move(coefficients), kStatusBefore};
-}
-
 PlainRegion simplexWith(std::vector<PlainConstraint> constraints) {
     PlainRegion made;
     made.lower.assign(3, 0.0);
@@ -203,16 +190,16 @@ TEST_P(ConstraintStatus, TellsWhichSidesDoNotCut) {
 INSTANTIATE_TEST_SUITE_P(
     Cases, ConstraintStatus,
     testing::Values(
-        StatusCase{"LowerCuts", atLeast(0.5, {1, 0, 0}), kStatusBefore, 3},
+        StatusCase{"LowerCuts", atLeast(0.5, {1, 0, 0}), STATUS_BEFORE, 3},
         StatusCase{"LowerRedundant", atLeast(-0.5, {1, 0, 0}), 1, 3},
         StatusCase{"LowerExcludesAll", atLeast(1.5, {1, 0, 0}), 1, 3},
         StatusCase{"LowerLeavesAVertex", atLeast(1.0, {1, 0, 0}), 1, 3},
-        StatusCase{"UpperCuts", atMost(0.5, {1, 0, 0}), kStatusBefore, 4},
+        StatusCase{"UpperCuts", atMost(0.5, {1, 0, 0}), STATUS_BEFORE, 4},
         StatusCase{"UpperRedundant", atMost(1.5, {1, 0, 0}), 2, 3},
         StatusCase{"UpperExcludesAll", atMost(-0.5, {1, 0, 0}), 2, 3},
         StatusCase{"UpperLeavesAnEdge", atMost(0.0, {1, 0, 0}), 2, 3},
         StatusCase{"UpperThroughAVertex", atMost(1.0, {1, 0, 0}), 2, 3},
-        StatusCase{"BothCut", between(0.2, 0.5, {1, 0, 0}), kStatusBefore, 4},
+        StatusCase{"BothCut", between(0.2, 0.5, {1, 0, 0}), STATUS_BEFORE, 4},
         StatusCase{"OnlyLowerCuts", between(0.2, 1.5, {1, 0, 0}), 2, 3},
         StatusCase{"OnlyUpperCuts", between(-0.2, 0.5, {1, 0, 0}), 1, 4},
         StatusCase{"NeitherCuts", between(-0.2, 1.5, {1, 0, 0}), 3, 3},
@@ -223,29 +210,29 @@ INSTANTIATE_TEST_SUITE_P(
         StatusCase{"TwoSidesWithoutLimit", between(-kInfinity, kInfinity, {1, 0, 0}), 3, 3},
         StatusCase{"OnlyLowerHasALimit", between(0.2, kInfinity, {1, 0, 0}), 2, 3},
         StatusCase{"OnlyUpperHasALimit", between(-kInfinity, 0.5, {1, 0, 0}), 1, 4},
-        StatusCase{"NoSide", PlainConstraint{false, 0.2, false, 0.5, {1, 0, 0}, kStatusBefore}, kStatusBefore, 4},
-        StatusCase{"NoSideAndRedundant", PlainConstraint{false, 0.2, false, 1.5, {1, 0, 0}, kStatusBefore}, 2, 3},
+        StatusCase{"NoSide", PlainConstraint{false, 0.2, false, 0.5, {1, 0, 0}, STATUS_BEFORE}, STATUS_BEFORE, 4},
+        StatusCase{"NoSideAndRedundant", PlainConstraint{false, 0.2, false, 1.5, {1, 0, 0}, STATUS_BEFORE}, 2, 3},
         StatusCase{"ZeroCoefficients", between(-1.0, 1.0, {0, 0, 0}), 3, 3},
         StatusCase{"CutsLessThanTheTolerance", atMost(1.0 - 5e-7, {1, 0, 0}), 2, 3},
-        StatusCase{"CutsMoreThanTheTolerance", atMost(1.0 - 2e-5, {1, 0, 0}), kStatusBefore, 4},
+        StatusCase{"CutsMoreThanTheTolerance", atMost(1.0 - 2e-5, {1, 0, 0}), STATUS_BEFORE, 4},
         StatusCase{"LeavesLessThanTheTolerance", atMost(5e-7, {1, 1, 0}), 2, 3}),
     [](const testing::TestParamInfo<StatusCase>& info) { return info.param.name; });
 
 TEST(ConstraintStatuses, EachConstraintHasItsOwn) {
     const auto found =
         enumerated(simplexWith({atMost(0.5, {1, 0, 0}), atLeast(-1.0, {0, 1, 0}), between(-1.0, 2.0, {0, 0, 1})}));
-    EXPECT_EQ(found.statuses, (std::vector<int>{kStatusBefore, 1, 3}));
+    EXPECT_EQ(found.statuses, (std::vector<int>{STATUS_BEFORE, 1, 3}));
 }
 
 TEST(ConstraintStatuses, ARepeatedConstraintIsRedundantTheSecondTime) {
     const auto found = enumerated(simplexWith({atMost(0.5, {1, 0, 0}), atMost(0.5, {1, 0, 0})}));
-    EXPECT_EQ(found.statuses, (std::vector<int>{kStatusBefore, 2}));
+    EXPECT_EQ(found.statuses, (std::vector<int>{STATUS_BEFORE, 2}));
     EXPECT_EQ(found.numPlanes, 7);
 }
 
 TEST(ConstraintStatuses, TheOppositeOfAConstraintLeavesAFaceAndDoesNotCut) {
     const auto found = enumerated(simplexWith({atMost(0.5, {1, 0, 0}), atLeast(0.5, {1, 0, 0})}));
-    EXPECT_EQ(found.statuses, (std::vector<int>{kStatusBefore, 1}));
+    EXPECT_EQ(found.statuses, (std::vector<int>{STATUS_BEFORE, 1}));
     EXPECT_EQ(found.numVertices, 4U);
 }
 
