@@ -1,9 +1,11 @@
 #include "support/random_regions.h"
 
+#include <algorithm>
 #include <cmath>
 #include <iomanip>
 #include <limits>
 #include <sstream>
+#include <utility>
 
 namespace reisti::test {
 
@@ -82,6 +84,12 @@ void RegionMaker::nudgeByUlps(std::vector<double>& bounds) {
 }
 
 void RegionMaker::bounds(std::size_t q, std::vector<double>& lower, std::vector<double>& upper) {
+    unsortedBounds(q, lower, upper);
+    for (std::size_t j = 0; j < q; ++j)
+        if (lower[j] > upper[j]) std::swap(lower[j], upper[j]);
+}
+
+void RegionMaker::unsortedBounds(std::size_t q, std::vector<double>& lower, std::vector<double>& upper) {
     switch (below(10)) {
         case 0:
         case 1:

@@ -39,6 +39,7 @@ class RegionMaker {
     std::vector<double> inside(const std::vector<double>& lower, const std::vector<double>& upper);
 
   private:
+    void unsortedBounds(std::size_t q, std::vector<double>& lower, std::vector<double>& upper);
     void roundedBounds(std::size_t q, std::vector<double>& lower, std::vector<double>& upper);
     void nudgeByUlps(std::vector<double>& bounds);
     std::vector<double> coefficients(std::size_t q);

@@ -92,7 +92,7 @@ INSTANTIATE_TEST_SUITE_P(Sizes, PlainEnumeration,
                                          Series{"SixComponents", 6, 1000, 4}, Series{"SevenComponents", 7, 120, 4},
                                          Series{"FourComponentsManyConstraints", 4, 600, 24},
                                          Series{"SixComponentsManyConstraints", 6, 100, 10}),
-                         [](const testing::TestParamInfo<Series>& info) { return info.param.name; });
+                         [](const auto& instance) { return instance.param.name; });
 
 class PlainBoundVertices : public testing::TestWithParam<std::size_t> {};
 
