@@ -1,28 +1,11 @@
-#include <algorithm>
-#include <array>
 #include <new>
 
 #include "capi/guard.h"
+#include "capi/required_arrays.h"
 #include "mixture/run_array.h"
 #include "mixture/simplex_centroid_design.h"
 #include "mixture/simplex_lattice_design.h"
 #include "reisti/reisti.h"
-
-namespace {
-
-/// Whether every array that a run reads or writes is there. Arrays of no entries are never touched and may be null;
-/// null replicates by type have a meaning of their own.
-bool hasRequiredArrays(const des_MixtureDesign& design) {
-    if (design.numAmounts != 0 && design.amounts == nullptr) return false;
-    if (design.numComponents == 0) return true;
-    const std::array<const void*, 8> arrays = {
-        design.lowerBounds,       design.upperBounds,       design.scaledLowerBounds, design.scaledUpperBounds,
-        design.pseudoLowerBounds, design.pseudoUpperBounds, design.pointsPerType,     design.boundaryCounts,
-    };
-    return std::ranges::none_of(arrays, [](const void* array) { return array == nullptr; });
-}
-
-}  // namespace
 
 extern "C" des_MixtureDesign* des_CreateMixtureDesignContainer() {
     auto* const design = new (std::nothrow) des_MixtureDesign{};
@@ -38,7 +21,7 @@ extern "C" des_MixtureDesign* des_CreateMixtureDesignContainer() {
 }
 
 extern "C" std::int32_t des_RunSimplexCentroidDesign(des_MixtureDesign* design) {
-    if (design == nullptr || !hasRequiredArrays(*design)) return des_ErrorNullPointer;
+    if (design == nullptr || !reisti::hasRequiredArrays(*design)) return des_ErrorNullPointer;
     return reisti::guard([design] {
         int error = 0;
         reisti::SimplexCentroidDesign(design).Calculate(error);
@@ -50,7 +33,7 @@ extern "C" std::int32_t des_RunSimplexLatticeDesign(des_MixtureDesign* design, s
                                                     std::uint8_t centerPoint) {
     if (design == nullptr) return des_ErrorNullPointer;
     if (!reisti::isLatticeDegreeAllowed(design->numComponents, degree)) return des_ErrorDegree;
-    if (!hasRequiredArrays(*design)) return des_ErrorNullPointer;
+    if (!reisti::hasRequiredArrays(*design)) return des_ErrorNullPointer;
     return reisti::guard([=] {
         int error = 0;
         reisti::SimplexLatticeDesign(design, degree, centerPoint != 0).Calculate(error);
