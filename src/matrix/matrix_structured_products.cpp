@@ -4,6 +4,8 @@
 #include <algorithm>
 
 #include "matrix/kernels/products.h"
+#include "matrix/kernels/scaling.h"
+#include "matrix/kernels/triangles.h"
 #include "matrix/matrix_checks.h"
 #include "matrix/matrix_products.h"
 #include "matrix/vector_kernels.h"
@@ -12,10 +14,17 @@ namespace qan::matrix_library {
 
 namespace {
 
+namespace kernels = reisti::kernels;
+
 using Index = std::ptrdiff_t;
 
-// Values of k in a strip. Wide strips cost more in the cut triangles, narrow ones more in traffic through the result.
-constexpr Index kStrip = 32;
+// Values of k in a strip. Scratch memory grows with the strip, up to an eighth of what a dense copy would take; narrow
+// strips cost more in traffic through the result.
+Index stripOf(Index order) {
+    constexpr Index kLeast = 32;
+    constexpr Index kMost = 128;
+    return std::clamp(order / 8 / kLeast * kLeast, kLeast, kMost);
+}
 
 // Some rows of row-major storage.
 struct Panel {
@@ -32,22 +41,63 @@ struct Target {
     Target from(Index row, Index column) const { return {data + row * stride + column, stride}; }
 };
 
-void accumulate(Panel a, Panel b, Target c, Index m, Index k, Index n) {
-    reisti::kernels::accumulateProduct(a.data, static_cast<std::size_t>(a.stride), b.data,
-                                       static_cast<std::size_t>(b.stride), c.data, static_cast<std::size_t>(c.stride),
-                                       static_cast<std::size_t>(m), static_cast<std::size_t>(k),
-                                       static_cast<std::size_t>(n));
+// Calls a kernel on two panels and a target, with some sizes.
+template <typename Kernel, typename... Sizes>
+void call(Kernel kernel, Panel a, Panel b, Target c, Sizes... sizes) {
+    kernel(a.data, static_cast<std::size_t>(a.stride), b.data, static_cast<std::size_t>(b.stride), c.data,
+           static_cast<std::size_t>(c.stride), static_cast<std::size_t>(sizes)...);
 }
 
-// accumulate where only the upper triangle of a, of b or of both counts.
-void accumulateUpper(Panel a, bool isUpperA, Panel b, bool isUpperB, Target c, Index m, Index k, Index n) {
-    for (Index i = 0; i < m; ++i) {
-        double* const sums = c.data + i * c.stride;
-        for (Index l = isUpperA ? i : 0; l < k; ++l) {
-            const double factor = a.data[i * a.stride + l];
-            const double* const row = b.data + l * b.stride;
-            for (Index j = isUpperB ? l : 0; j < n; ++j) {
-                sums[j] += factor * row[j];
+// c (m x n) += a (m x k) * b (k x n).
+void accumulate(Panel a, Panel b, Target c, Index m, Index k, Index n) {
+    call(kernels::accumulateProduct, a, b, c, m, k, n);
+}
+
+constexpr Index kSmallTriangle = kernels::kSmallTriangle;
+
+// How many rows of a triangle of k go into the first half: a whole number of small triangles.
+Index firstPart(Index k) {
+    return (k / 2 + kSmallTriangle - 1) / kSmallTriangle * kSmallTriangle;
+}
+
+// c += a * b where only the upper triangle of a, k x k, counts. In halves: what lies beside a half is a full product.
+void accumulateUpperLeft(Panel a, Panel b, Target c, Index k, Index n) {
+    if (k > kSmallTriangle) {
+        const Index half = firstPart(k);
+        accumulateUpperLeft(a, b, c, half, n);
+        accumulate(a.from(0, half), b.from(half, 0), c, half, k - half, n);
+        accumulateUpperLeft(a.from(half, half), b.from(half, 0), c.from(half, 0), k - half, n);
+        return;
+    }
+    call(kernels::accumulateUpperLeft, a, b, c, k, n);
+}
+
+// c += a * b where only the upper triangle of b, k x k, counts; a has m rows.
+void accumulateUpperRight(Panel a, Panel b, Target c, Index m, Index k) {
+    if (k > kSmallTriangle) {
+        const Index half = firstPart(k);
+        accumulateUpperRight(a, b, c, m, half);
+        accumulate(a, b.from(0, half), c.from(0, half), m, half, k - half);
+        accumulateUpperRight(a.from(0, half), b.from(half, half), c.from(0, half), m, k - half);
+        return;
+    }
+    call(kernels::accumulateUpperRight, a, b, c, m, k);
+}
+
+// c += a * b where only the upper triangles of both, k x k, count.
+void accumulateUpperBoth(Panel a, Panel b, Target c, Index k) {
+    if (k > kSmallTriangle) {
+        const Index half = firstPart(k);
+        accumulateUpperBoth(a, b, c, half);
+        accumulateUpperLeft(a, b.from(0, half), c.from(0, half), half, k - half);
+        accumulateUpperRight(a.from(0, half), b.from(half, half), c.from(0, half), half, k - half);
+        accumulateUpperBoth(a.from(half, half), b.from(half, half), c.from(half, half), k - half);
+        return;
+    }
+    for (Index i = 0; i < k; ++i) {
+        for (Index l = i; l < k; ++l) {
+            for (Index j = l; j < k; ++j) {
+                c.data[i * c.stride + j] += a.data[i * a.stride + l] * b.data[l * b.stride + j];
             }
         }
     }
@@ -88,34 +138,35 @@ class SymmetricOperand {
   public:
     static constexpr bool kIsUpper = false;
 
-    explicit SymmetricOperand(const Smatrix<double>& s) : packed_(s.data()), order_(s.rowCount()) {}
+    explicit SymmetricOperand(const Smatrix<double>& s)
+        : packed_(s.data()), order_(s.rowCount()), strip_(stripOf(order_)) {}
 
     Panel columns(Index k0, Index k1) {
-        scratch_.resize(static_cast<std::size_t>(order_ * kStrip));
+        scratch_.resize(static_cast<std::size_t>(order_ * strip_));
         // Above the strip its columns are stored as rows; a few rows of the strip at a time stay in the cache.
         constexpr Index kBand = 16;
         for (Index band = 0; band < k0; band += kBand) {
             for (Index k = k0; k < k1; ++k) {
                 const double* const stored = packed_ + packedRow(k);
                 for (Index i = band; i < std::min(band + kBand, k0); ++i) {
-                    scratch_.data()[i * kStrip + k - k0] = stored[i];
+                    scratch_.data()[i * strip_ + k - k0] = stored[i];
                 }
             }
         }
         for (Index i = k0; i < k1; ++i) {
             for (Index k = k0; k < k1; ++k) {
-                scratch_.data()[i * kStrip + k - k0] = packed_[packedRow(std::max(i, k)) + std::min(i, k)];
+                scratch_.data()[i * strip_ + k - k0] = packed_[packedRow(std::max(i, k)) + std::min(i, k)];
             }
         }
         for (Index i = k1; i < order_; ++i) {
-            std::copy_n(packed_ + packedRow(i) + k0, k1 - k0, scratch_.data() + i * kStrip);
+            std::copy_n(packed_ + packedRow(i) + k0, k1 - k0, scratch_.data() + i * strip_);
         }
-        return {scratch_.data(), kStrip};
+        return {scratch_.data(), strip_};
     }
 
     Panel rows(Index k0, Index k1) {
         const Index stride = scatteredStride(order_);
-        scratch_.resize(static_cast<std::size_t>(stride * kStrip));
+        scratch_.resize(static_cast<std::size_t>(stride * strip_));
         for (Index k = k0; k < k1; ++k) {
             std::copy_n(packed_ + packedRow(k), k + 1, scratch_.data() + (k - k0) * stride);
         }
@@ -132,6 +183,7 @@ class SymmetricOperand {
   private:
     const double* packed_;
     Index order_;
+    Index strip_;
     std::vector<double> scratch_;
 };
 
@@ -139,22 +191,23 @@ class UpperOperand {
   public:
     static constexpr bool kIsUpper = true;
 
-    explicit UpperOperand(const UTmatrix<double>& u) : packed_(u.data()), order_(u.rowCount()) {}
+    explicit UpperOperand(const UTmatrix<double>& u)
+        : packed_(u.data()), order_(u.rowCount()), strip_(stripOf(order_)) {}
 
     // Rows 0 to k1.
     Panel columns(Index k0, Index k1) {
-        scratch_.resize(static_cast<std::size_t>(order_ * kStrip));
+        scratch_.resize(static_cast<std::size_t>(order_ * strip_));
         for (Index i = 0; i < k1; ++i) {
             const Index first = std::max(i, k0);
-            std::copy_n(packed_ + upperRow(order_, i) + first, k1 - first, scratch_.data() + i * kStrip + first - k0);
+            std::copy_n(packed_ + upperRow(order_, i) + first, k1 - first, scratch_.data() + i * strip_ + first - k0);
         }
-        return {scratch_.data(), kStrip};
+        return {scratch_.data(), strip_};
     }
 
     // Columns k0 to the end, the first of them at column k0 of the panel.
     Panel rows(Index k0, Index k1) {
         const Index stride = scatteredStride(order_);
-        scratch_.resize(static_cast<std::size_t>(stride * kStrip));
+        scratch_.resize(static_cast<std::size_t>(stride * strip_));
         for (Index k = k0; k < k1; ++k) {
             std::copy_n(packed_ + upperRow(order_, k) + k, order_ - k, scratch_.data() + (k - k0) * stride + k);
         }
@@ -164,6 +217,7 @@ class UpperOperand {
   private:
     const double* packed_;
     Index order_;
+    Index strip_;
     std::vector<double> scratch_;
 };
 
@@ -175,15 +229,16 @@ matrix<double> multiplyByStrips(Left left, Right right, int m, int depth, int n)
     matrix<double> result(m, n, 0.0);
     if (result.empty()) return result;
     const Target c{result.data(), n};
-    for (Index k0 = 0; k0 < depth; k0 += kStrip) {
-        const Index k1 = std::min<Index>(k0 + kStrip, depth);
+    const Index strip = stripOf(depth);
+    for (Index k0 = 0; k0 < depth; k0 += strip) {
+        const Index k1 = std::min<Index>(k0 + strip, depth);
         const Panel a = left.columns(k0, k1);
         const Panel b = right.rows(k0, k1);
         if constexpr (Left::kIsUpper) {
             accumulate(a, b, c, k0, k1 - k0, n);
-            accumulateUpper(a.from(k0, 0), true, b, false, c.from(k0, 0), k1 - k0, k1 - k0, n);
+            accumulateUpperLeft(a.from(k0, 0), b, c.from(k0, 0), k1 - k0, n);
         } else if constexpr (Right::kIsUpper) {
-            accumulateUpper(a, false, b.from(0, k0), true, c.from(0, k0), m, k1 - k0, k1 - k0);
+            accumulateUpperRight(a, b.from(0, k0), c.from(0, k0), m, k1 - k0);
             accumulate(a, b.from(0, k1), c.from(0, k1), m, k1 - k0, n - k1);
         } else {
             accumulate(a, b, c, m, k1 - k0, n);
@@ -198,89 +253,104 @@ matrix<double> symmetricTimesVector(const Smatrix<double>& s, const double* x) {
     return result;
 }
 
-// Rows i0 to i1 of a * b, both upper triangular, into c, whose first column is column i0 of the product.
+// Rows i0 to i1 of a * b, both upper triangular, into c, whose first column is column i0 of the product. The number of
+// rows is that of a strip, or all that are left.
 void multiplyUpperRows(const UTmatrix<double>& a, UpperOperand& b, Index i0, Index i1, Target c) {
     const Index order = a.rowCount();
     const Index rows = i1 - i0;
     const Index width = order - i0;
-    std::vector<double> strip(static_cast<std::size_t>(rows * width));
+    std::vector<double> unpacked(static_cast<std::size_t>(rows * width));
     for (Index i = i0; i < i1; ++i) {
-        std::copy_n(a.data() + upperRow(order, i) + i, order - i, strip.data() + (i - i0) * width + i - i0);
+        std::copy_n(a.data() + upperRow(order, i) + i, order - i, unpacked.data() + (i - i0) * width + i - i0);
     }
-    const Panel left{strip.data(), width};
-    for (Index k0 = i0; k0 < order; k0 += kStrip) {
-        const Index k1 = std::min(k0 + kStrip, order);
-        const Index depth = k1 - k0;
-        const bool isDiagonal = k0 == i0;
+    const Panel left{unpacked.data(), width};
+
+    const Panel first = b.rows(i0, i1);
+    accumulateUpperBoth(left, first.from(0, i0), c, rows);
+    accumulateUpperLeft(left, first.from(0, i1), c.from(0, rows), rows, order - i1);
+    const Index strip = stripOf(order);
+    for (Index k0 = i1; k0 < order; k0 += strip) {
+        const Index k1 = std::min(k0 + strip, order);
         const Panel factors = left.from(0, k0 - i0);
         const Panel right = b.rows(k0, k1);
-        accumulateUpper(factors, isDiagonal, right.from(0, k0), true, c.from(0, k0 - i0), rows, depth, depth);
-        if (isDiagonal) {
-            accumulateUpper(factors, true, right.from(0, k1), false, c.from(0, k1 - i0), rows, depth, order - k1);
-        } else {
-            accumulate(factors, right.from(0, k1), c.from(0, k1 - i0), rows, depth, order - k1);
-        }
+        accumulateUpperRight(factors, right.from(0, k0), c.from(0, k0 - i0), rows, k1 - k0);
+        accumulate(factors, right.from(0, k1), c.from(0, k1 - i0), rows, k1 - k0, order - k1);
     }
 }
 
-// The product of one term is still a sum that starts from 0.0: minus zero becomes zero.
-double oneTerm(double x, double y) {
-    return 0.0 + x * y;
-}
+// A scale multiplies elements of row i of a result, in place: `count` of them from column `first` on.
 
-// Rows of a dense matrix are copied and scaled a few at a time, while they are in the cache.
+// Row i by element i of the diagonal.
+struct ByRow {
+    const double* diagonal;
+
+    void operator()(double* elements, Index i, Index, Index count) const {
+        kernels::scaleRow(elements, diagonal[i], static_cast<std::size_t>(count));
+    }
+};
+
+// Every row element for element by the diagonal.
+struct ByColumn {
+    const double* diagonal;
+
+    void operator()(double* elements, Index, Index first, Index count) const {
+        kernels::scaleElements(elements, diagonal + first, static_cast<std::size_t>(count));
+    }
+};
+
+// So many elements are copied and scaled at a time, while they are in the nearest cache.
+constexpr Index kElementsAtOnce = 512;
+
 template <typename Scale>
-matrix<double> copyAndScaleRows(const matrix<double>& a, Scale scale) {
+matrix<double> copyAndScale(const matrix<double>& a, Scale scale) {
     if (a.empty()) return a;
-    constexpr Index kElementsAtOnce = 1024;
     const Index cols = a.colCount();
     const Index rowsAtOnce = std::max<Index>(kElementsAtOnce / cols, 1);
+    const Index colsAtOnce = std::min(kElementsAtOnce, cols);
     std::vector<double> elements;
     elements.reserve(static_cast<std::size_t>(a.size()));
     for (Index i0 = 0; i0 < a.rowCount(); i0 += rowsAtOnce) {
         const Index i1 = std::min<Index>(i0 + rowsAtOnce, a.rowCount());
-        elements.insert(elements.end(), a.data() + i0 * cols, a.data() + i1 * cols);
-        for (Index i = i0; i < i1; ++i) {
-            scale(elements.data() + i * cols, i, cols);
+        for (Index j0 = 0; j0 < cols; j0 += colsAtOnce) {
+            // Either some whole rows or a part of one.
+            const Index count = std::min(colsAtOnce, cols - j0);
+            const double* const source = a.data() + i0 * cols + j0;
+            elements.insert(elements.end(), source, source + (i1 - i0) * count);
+            for (Index i = i0; i < i1; ++i) {
+                scale(elements.data() + i * cols + j0, i, j0, count);
+            }
         }
     }
     return matrix<double>(std::move(elements), a.colCount());
 }
 
-// Multiplies rows, of any length, by one element of the diagonal each; or element for element by the diagonal.
-auto byRow(const double* diagonal) {
-    return [diagonal](double* row, Index i, Index cols) {
-        const double factor = diagonal[i];
-        for (Index j = 0; j < cols; ++j) {
-            row[j] = oneTerm(factor, row[j]);
-        }
-    };
-}
-
-auto byColumn(const double* diagonal) {
-    return [diagonal](double* row, Index, Index cols) {
-        for (Index j = 0; j < cols; ++j) {
-            row[j] = oneTerm(row[j], diagonal[j]);
-        }
-    };
-}
-
 template <typename Scale>
-matrix<double> unpackAndScaleRows(const Smatrix<double>& s, Scale scale) {
+matrix<double> unpackAndScale(const Smatrix<double>& s, Scale scale) {
     const Index order = s.rowCount();
     SymmetricOperand operand(s);
     std::vector<double> elements;
     elements.reserve(static_cast<std::size_t>(elementCount(order, order)));
-    for (Index i0 = 0; i0 < order; i0 += kStrip) {
-        const Index i1 = std::min(i0 + kStrip, order);
-        const Panel strip = operand.rows(i0, i1);
+    const Index strip = stripOf(order);
+    for (Index i0 = 0; i0 < order; i0 += strip) {
+        const Index i1 = std::min(i0 + strip, order);
+        const Panel rows = operand.rows(i0, i1);
         for (Index i = i0; i < i1; ++i) {
-            const double* const row = strip.from(i - i0, 0).data;
+            const double* const row = rows.from(i - i0, 0).data;
             elements.insert(elements.end(), row, row + order);
-            scale(elements.data() + i * order, i, order);
+            scale(elements.data() + i * order, i, 0, order);
         }
     }
     return matrix<double>(std::move(elements), s.rowCount());
+}
+
+template <typename Scale>
+UTmatrix<double> scaleUpper(const UTmatrix<double>& u, Scale scale) {
+    UTmatrix<double> result(u);
+    const Index order = u.rowCount();
+    for (Index i = 0; i < order; ++i) {
+        scale(result.data() + upperRow(order, i) + i, i, i, order - i);
+    }
+    return result;
 }
 
 }  // namespace
@@ -294,12 +364,17 @@ matrix<double> operator*(const matrix<double>& a, const Smatrix<double>& b) {
 
 matrix<double> operator*(const matrix<double>& a, const UTmatrix<double>& b) {
     checkMultiplyDimensions(a, b);
+    if (a.rowCount() == 1) {
+        matrix<double> result(1, b.colCount(), 0.0);
+        rowTimesUpper(a.data(), b.data(), static_cast<std::size_t>(b.rowCount()), result.data());
+        return result;
+    }
     return multiplyByStrips(DenseOperand(a), UpperOperand(b), a.rowCount(), b.rowCount(), b.colCount());
 }
 
 matrix<double> operator*(const matrix<double>& a, const Dmatrix<double>& b) {
     checkMultiplyDimensions(a, b);
-    return copyAndScaleRows(a, byColumn(b.data()));
+    return copyAndScale(a, ByColumn{b.data()});
 }
 
 matrix<double> operator*(const Smatrix<double>& a, const matrix<double>& b) {
@@ -320,11 +395,16 @@ matrix<double> operator*(const Smatrix<double>& a, const UTmatrix<double>& b) {
 
 matrix<double> operator*(const Smatrix<double>& a, const Dmatrix<double>& b) {
     checkMultiplyDimensions(a, b);
-    return unpackAndScaleRows(a, byColumn(b.data()));
+    return unpackAndScale(a, ByColumn{b.data()});
 }
 
 matrix<double> operator*(const UTmatrix<double>& a, const matrix<double>& b) {
     checkMultiplyDimensions(a, b);
+    if (b.colCount() == 1) {
+        matrix<double> result(a.rowCount(), 1, 0.0);
+        upperTimesColumn(a.data(), static_cast<std::size_t>(a.rowCount()), b.data(), result.data());
+        return result;
+    }
     return multiplyByStrips(UpperOperand(a), DenseOperand(b), a.rowCount(), b.rowCount(), b.colCount());
 }
 
@@ -338,8 +418,9 @@ UTmatrix<double> operator*(const UTmatrix<double>& a, const UTmatrix<double>& b)
     const Index order = a.rowCount();
     UTmatrix<double> result(a.rowCount(), 0.0);
     UpperOperand right(b);
-    for (Index i0 = 0; i0 < order; i0 += kStrip) {
-        const Index i1 = std::min(i0 + kStrip, order);
+    const Index strip = stripOf(order);
+    for (Index i0 = 0; i0 < order; i0 += strip) {
+        const Index i1 = std::min(i0 + strip, order);
         const Index width = order - i0;
         std::vector<double> sums(static_cast<std::size_t>((i1 - i0) * width));
         multiplyUpperRows(a, right, i0, i1, {sums.data(), width});
@@ -352,32 +433,22 @@ UTmatrix<double> operator*(const UTmatrix<double>& a, const UTmatrix<double>& b)
 
 UTmatrix<double> operator*(const UTmatrix<double>& a, const Dmatrix<double>& b) {
     checkMultiplyDimensions(a, b);
-    UTmatrix<double> result(a);
-    const Index order = a.rowCount();
-    for (Index i = 0; i < order; ++i) {
-        byColumn(b.data() + i)(result.data() + upperRow(order, i) + i, i, order - i);
-    }
-    return result;
+    return scaleUpper(a, ByColumn{b.data()});
 }
 
 matrix<double> operator*(const Dmatrix<double>& a, const matrix<double>& b) {
     checkMultiplyDimensions(a, b);
-    return copyAndScaleRows(b, byRow(a.data()));
+    return copyAndScale(b, ByRow{a.data()});
 }
 
 matrix<double> operator*(const Dmatrix<double>& a, const Smatrix<double>& b) {
     checkMultiplyDimensions(a, b);
-    return unpackAndScaleRows(b, byRow(a.data()));
+    return unpackAndScale(b, ByRow{a.data()});
 }
 
 UTmatrix<double> operator*(const Dmatrix<double>& a, const UTmatrix<double>& b) {
     checkMultiplyDimensions(a, b);
-    UTmatrix<double> result(b);
-    const Index order = b.rowCount();
-    for (Index i = 0; i < order; ++i) {
-        byRow(a.data())(result.data() + upperRow(order, i) + i, i, order - i);
-    }
-    return result;
+    return scaleUpper(b, ByRow{a.data()});
 }
 
 Dmatrix<double> operator*(const Dmatrix<double>& a, const Dmatrix<double>& b) {

@@ -46,6 +46,23 @@ void addSymmetricRows(const double* s, std::size_t first, const double* x, doubl
     }
 }
 
+// Rows of an upper triangle, kRows of them; rows[r] is where row r would begin if it had all columns.
+template <std::size_t kRows>
+void upperRowsTimesColumn(const double* const* rows, std::size_t first, std::size_t order, const double* x, double* y) {
+    double sum[kRows] = {};
+    for (std::size_t r = 0; r < kRows; ++r) {
+        for (std::size_t k = first + r; k < first + kRows; ++k) {
+            sum[r] += rows[r][k] * x[k];
+        }
+    }
+    for (std::size_t k = first + kRows; k < order; ++k) {
+        for (std::size_t r = 0; r < kRows; ++r) {
+            sum[r] += rows[r][k] * x[k];
+        }
+    }
+    std::copy_n(sum, kRows, y + first);
+}
+
 }  // namespace
 
 void timesColumn(const double* a, std::size_t rows, std::size_t cols, const double* x, double* y) {
@@ -66,6 +83,30 @@ void symmetricTimesColumn(const double* s, std::size_t order, const double* x, d
     }
     for (; k < order; ++k) {
         addSymmetricRows<1>(s, k, x, y);
+    }
+}
+
+void upperTimesColumn(const double* u, std::size_t order, const double* x, double* y) {
+    const double* rows[kTogether];
+    std::size_t i = 0;
+    for (; i + kTogether <= order; i += kTogether) {
+        for (std::size_t r = 0; r < kTogether; ++r) {
+            rows[r] = u + (i + r) * order - (i + r) * (i + r + 1) / 2;
+        }
+        upperRowsTimesColumn<kTogether>(rows, i, order, x, y);
+    }
+    for (; i < order; ++i) {
+        rows[0] = u + i * order - i * (i + 1) / 2;
+        upperRowsTimesColumn<1>(rows, i, order, x, y);
+    }
+}
+
+void rowTimesUpper(const double* x, const double* u, std::size_t order, double* y) {
+    std::fill_n(y, order, 0.0);
+    for (std::size_t k = 0; k < order; ++k) {
+        for (std::size_t j = k; j < order; ++j) {
+            y[j] += x[k] * *u++;
+        }
     }
 }
 

@@ -12,6 +12,10 @@ void timesColumn(const double* a, std::size_t rows, std::size_t cols, const doub
 // y = s * x for the packed lower triangle s of a symmetric matrix; every stored element is read once.
 void symmetricTimesColumn(const double* s, std::size_t order, const double* x, double* y);
 
+// y = u * x, and y = x * u for x as a row, for the packed upper triangle u.
+void upperTimesColumn(const double* u, std::size_t order, const double* x, double* y);
+void rowTimesUpper(const double* x, const double* u, std::size_t order, double* y);
+
 }  // namespace qan::matrix_library
 
 #endif

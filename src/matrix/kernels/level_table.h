@@ -5,6 +5,7 @@
 #include <cstddef>
 
 #include "matrix/kernels/level.h"
+#include "matrix/kernels/triangles.h"
 
 namespace reisti::kernels {
 
@@ -17,6 +18,16 @@ struct LevelTable {
     Product productLeftTransposed;
     Product productRightTransposed;
     AccumulateProduct accumulateProduct;
+
+    // As in scaling.h.
+    void (*scaleRow)(double* row, double factor, std::size_t n);
+    void (*scaleElements)(double* row, const double* factors, std::size_t n);
+
+    // As in triangles.h.
+    void (*accumulateUpperLeft)(const double* a, std::size_t aStride, const double* b, std::size_t bStride, double* c,
+                                std::size_t cStride, std::size_t k, std::size_t n);
+    void (*accumulateUpperRight)(const double* a, std::size_t aStride, const double* b, std::size_t bStride, double* c,
+                                 std::size_t cStride, std::size_t m, std::size_t k);
 
     // As in factorizations.h.
     bool (*factorLu)(double* a, std::size_t n, int* index, double& parity);
