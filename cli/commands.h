@@ -10,6 +10,7 @@ namespace cli {
 void addDsdCommand(CLI::App& app);
 void addCentroidCommand(CLI::App& app);
 void addLatticeCommand(CLI::App& app);
+void addVerticesCommand(CLI::App& app);
 void addCatalogCommand(CLI::App& app);
 
 }  // namespace cli

@@ -30,6 +30,7 @@ int run(int argc, char** argv) {
     cli::addDsdCommand(app);
     cli::addCentroidCommand(app);
     cli::addLatticeCommand(app);
+    cli::addVerticesCommand(app);
     cli::addCatalogCommand(app);
     try {
         app.parse(argc, argv);

@@ -31,7 +31,9 @@ std::string formatExact(double value, char decimalMark) {
 }
 
 std::string formatShort(double value, char decimalMark) {
-    return withMark(fmt::format("{:.6g}", value + 0.0), decimalMark);
+    constexpr double kWholeBelow = 1e15;
+    if (value == std::trunc(value) && std::abs(value) < kWholeBelow) return fmt::format("{:.0f}", value + 0.0);
+    return withMark(fmt::format("{:.6g}", value), decimalMark);
 }
 
 double withoutRoundingNoise(double value) {

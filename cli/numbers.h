@@ -14,7 +14,7 @@ std::optional<double> parseNumber(std::string_view text);
 /// The shortest text that reads back as the same double.
 std::string formatExact(double value, char decimalMark);
 
-/// Six significant digits, for people.
+/// Six significant digits, whole numbers whole: for people.
 std::string formatShort(double value, char decimalMark);
 
 /// The double nearest to the value's first 15 significant digits: takes off what arithmetic on typed decimals leaves in
