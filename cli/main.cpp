@@ -6,6 +6,7 @@
 #include <iostream>
 #include <new>
 #include <string>
+#include <vector>
 
 #include "commands.h"
 #include "reisti/reisti.h"
@@ -17,6 +18,9 @@ namespace {
 int reportParseError(const CLI::App& app, const CLI::ParseError& error) {
     if (error.get_exit_code() == 0) return app.exit(error);
     std::string message = error.what();
+    // The parser misses a command before it looks at the word that stands in its place.
+    const std::vector<std::string> unknown = app.remaining();
+    if (app.get_subcommands().empty() && !unknown.empty()) message = "no such command or option: " + unknown.front();
     std::replace(message.begin(), message.end(), '\n', ' ');
     std::cerr << "reisti: " << message << " (see --help)\n";
     return cli::kExitBadUsage;

@@ -79,9 +79,9 @@ void addCentroidCommand(CLI::App& app) {
         "Columns: std_order, run_order, point_type (1 vertex, k blend of k components, 0 overall\n"
         "centroid, -1 axial point), amount with --total or --amount, components, process variables.\n"
         "\n"
-        "Example: a fruit punch of three juices with lower bounds, 100 ounces in all, centroid three times:\n"
-        "  reisti centroid --component \"watermelon=20:100\" --component \"pineapple=10:100\" \\\n"
-        "    --component \"orange=10:100\" --total 100 --replicates center=3 --response Taste --seed 7");
+        "Example: a fruit punch of three juices, at least 30 of 100 parts watermelon, centroid three times:\n"
+        "  reisti centroid --component \"watermelon=30:100\" --component \"pineapple=0:100\" \\\n"
+        "    --component \"orange=0:100\" --total 100 --replicates center=3 --response Taste --seed 7");
     command->callback([options] { runCentroid(*options); });
 }
 
