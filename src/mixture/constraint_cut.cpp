@@ -28,21 +28,21 @@ bool isOn(double value) {
     return std::fabs(value) < kOnPlaneAbsolute;
 }
 
-/// Calls visit(hash) for every set of `size` planes out of a vertex's planes, for vertices on at most size + 2 planes.
-template <typename Visit>
-void visitPlaneSets(const std::vector<std::uint64_t>& keys, std::size_t size, Visit&& visit) {
+/// Hashes of all sets of `size` planes out of a vertex's planes, for vertices on at most size + 2 planes.
+void hashPlaneSets(const std::vector<std::uint64_t>& keys, std::size_t size, std::vector<std::uint64_t>& hashes) {
+    hashes.clear();
     std::uint64_t all = 0;
     for (const std::uint64_t key : keys)
         all ^= key;
     if (keys.size() == size) {
-        visit(all);
+        hashes.push_back(all);
     } else if (keys.size() == size + 1) {
         for (const std::uint64_t key : keys)
-            visit(all ^ key);
+            hashes.push_back(all ^ key);
     } else if (keys.size() == size + 2) {
         for (std::size_t i = 0; i < keys.size(); ++i)
             for (std::size_t j = i + 1; j < keys.size(); ++j)
-                visit(all ^ keys[i] ^ keys[j]);
+                hashes.push_back(all ^ keys[i] ^ keys[j]);
     }
 }
 
@@ -68,13 +68,16 @@ class CutRegion::Neighbours {
     Neighbours(const CutRegion& region, std::size_t numBelow, std::vector<std::uint32_t> above)
         : region_(region), above_(std::move(above)), tryAll_(numBelow * above_.size() <= kFewPairs || region.q_ < 3) {
         if (tryAll_) return;
+        table_.reserve(above_.size() * (region.q_ - 1));
         for (const std::uint32_t vertex : above_) {
             collectKeys(vertex);
             if (keys_.size() > edgePlanes() + 2) {
                 crowded_.push_back(vertex);
-            } else {
-                visitPlaneSets(keys_, edgePlanes(), [&](std::uint64_t hash) { table_.insert(hash, vertex); });
+                continue;
             }
+            hashSets();
+            for (const std::uint64_t hash : hashes_)
+                table_.insert(hash, vertex);
         }
     }
 
@@ -90,7 +93,9 @@ class CutRegion::Neighbours {
             std::for_each(above_.begin(), above_.end(), collect);
             return found_;
         }
-        visitPlaneSets(keys_, edgePlanes(), [&](std::uint64_t hash) { table_.any(hash, collect); });
+        hashSets();
+        for (const std::uint64_t hash : hashes_)
+            table_.any(hash, collect);
         std::for_each(crowded_.begin(), crowded_.end(), collect);
         std::sort(found_.begin(), found_.end());
         found_.erase(std::unique(found_.begin(), found_.end()), found_.end());
@@ -99,6 +104,13 @@ class CutRegion::Neighbours {
 
   private:
     std::size_t edgePlanes() const { return region_.q_ - 2; }
+
+    /// Hashes of all sets of planes that an edge can have, from keys_.
+    void hashSets() {
+        hashPlaneSets(keys_, edgePlanes(), hashes_);
+        for (const std::uint64_t hash : hashes_)
+            table_.prefetch(hash);
+    }
 
     /// One key per plane on which the vertex lies; a set of planes is hashed to the exclusive or of its keys.
     void collectKeys(std::size_t vertex) {
@@ -115,6 +127,7 @@ class CutRegion::Neighbours {
     std::vector<std::uint32_t> crowded_;
     IdTable table_;
     std::vector<std::uint64_t> keys_;
+    std::vector<std::uint64_t> hashes_;
     std::vector<std::uint32_t> found_;
 };
 
@@ -128,6 +141,12 @@ CutRegion::CutRegion(std::size_t q, std::vector<double> points, std::vector<doub
         for (std::size_t p = 0; p < numPlanes(); ++p)
             if (isOn(slack[v * numPlanes() + p]))
                 masks_[v * words_ + p / kWordBits] |= std::uint64_t{1} << (p % kWordBits);
+}
+
+std::vector<double> CutRegion::takePoints() && {
+    std::vector<std::uint64_t>().swap(masks_);
+    points_.shrink_to_fit();
+    return std::move(points_);
 }
 
 bool CutRegion::areAdjacent(std::size_t a, std::size_t b) const {
@@ -157,18 +176,51 @@ bool CutRegion::cut(const std::vector<double>& plane) {
     return true;
 }
 
-/// Appends the points at which edges meet the plane, and their values of the plane. A point is compared with the
-/// vertices that stay and with those added before it, not with those that are about to go: a corner beside a vertex
-/// that is cut off would vanish with it.
+/// The points that a cut must not double: the vertices that stay and the points added before. A vertex that is about to
+/// go does not count: a corner beside it would vanish with it.
+///
+/// A new point lies on the plane, so only vertices beside the plane are filed.
+class CutRegion::TakenPlaces {
+  public:
+    TakenPlaces(const CutRegion& region, const std::vector<double>& plane, const std::vector<double>& values)
+        : region_(region), values_(values), numOld_(values.size()), index_(region.q_) {
+        double slope = 0.0;
+        for (std::size_t j = 0; j < region.q_; ++j)
+            slope += std::fabs(plane[j]);
+        // Points that differ nowhere by more than the tolerance differ by no more than this in the plane's function.
+        reach_ = 1.01 * kSamePointAbsolute * slope;
+        for (std::uint32_t v = 0; v < numOld_; ++v)
+            if (isKept(values[v]) && std::fabs(values[v]) <= 2.0 * reach_) add(region.row(v), v);
+    }
+
+    void add(const double* point, std::uint32_t vertex) { index_.insert(index_.place(point), vertex); }
+
+    /// @param value the plane's function at the point
+    bool contain(const double* point, double value) const {
+        const auto isSame = [&](std::uint32_t v) { return isSamePoint(region_.row(v), point, region_.q_); };
+        if (index_.contains(index_.place(point), isSame)) return true;
+        // Huge coefficients can put a new point off the plane, and those not filed beside it.
+        for (std::uint32_t v = 0; !(std::fabs(value) <= 0.9 * reach_) && v < numOld_; ++v)
+            if (isKept(values_[v]) && isSame(v)) return true;
+        return false;
+    }
+
+  private:
+    const CutRegion& region_;
+    const std::vector<double>& values_;
+    std::size_t numOld_;
+    double reach_;
+    PointIndex index_;
+};
+
+/// Appends the points at which edges meet the plane, and their values of the plane.
 void CutRegion::addCutVertices(const std::vector<double>& plane, std::vector<double>& values) {
-    PointIndex index(q_);
+    TakenPlaces taken(*this, plane, values);
     std::vector<std::uint32_t> below;
     std::vector<std::uint32_t> above;
-    const auto numOld = static_cast<std::uint32_t>(values.size());
-    for (std::uint32_t v = 0; v < numOld; ++v) {
+    for (std::uint32_t v = 0; v < values.size(); ++v) {
         if (values[v] < -kOnPlaneAbsolute) below.push_back(v);
         if (values[v] > kOnPlaneAbsolute) above.push_back(v);
-        if (isKept(values[v])) index.insert(index.place(row(v)), v);
     }
 
     // New vertices that huge coefficients put off the plane are met by the edges that come after them.
@@ -176,17 +228,17 @@ void CutRegion::addCutVertices(const std::vector<double>& plane, std::vector<dou
     std::vector<double> point(q_);
     const auto meet = [&](std::uint32_t a, std::uint32_t b) {
         meetPlane(row(a), row(b), values[a], values[b], q_, point.data());
-        const PointIndex::Place place = index.place(point.data());
-        if (index.contains(place, [&](std::uint32_t v) { return isSamePoint(row(v), point.data(), q_); })) return;
+        const double value = planeValue(plane.data(), point.data(), q_);
+        if (taken.contain(point.data(), value)) return;
 
-        const std::size_t added = values.size();
         if (points_.size() + q_ > static_cast<std::size_t>(std::numeric_limits<int>::max()))
             throw std::length_error("more vertices than a matrix holds");
-        index.insert(place, static_cast<std::uint32_t>(added));
+        const auto added = static_cast<std::uint32_t>(values.size());
+        taken.add(point.data(), added);
         points_.insert(points_.end(), point.begin(), point.end());
-        values.push_back(planeValue(plane.data(), point.data(), q_));
+        values.push_back(value);
         appendMask(point.data());
-        if (values.back() > kOnPlaneAbsolute) aboveByRounding.push_back(static_cast<std::uint32_t>(added));
+        if (value > kOnPlaneAbsolute) aboveByRounding.push_back(added);
     };
 
     Neighbours neighbours(*this, below.size(), std::move(above));

@@ -49,11 +49,12 @@ class CutRegion {
     std::size_t numVertices() const { return points_.size() / q_; }
     std::size_t numPlanes() const { return planes_.size() / (q_ + 1); }
     const std::vector<double>& planes() const { return planes_; }
-    const std::vector<double>& points() const { return points_; }
-    std::vector<double> takePoints() { return std::move(points_); }
+    /// The points, with no more memory than they need; the region is spent.
+    std::vector<double> takePoints() &&;
 
   private:
     class Neighbours;
+    class TakenPlaces;
 
     const double* row(std::size_t vertex) const { return &points_[vertex * q_]; }
     const std::uint64_t* mask(std::size_t vertex) const { return &masks_[vertex * words_]; }

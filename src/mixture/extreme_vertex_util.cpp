@@ -148,10 +148,8 @@ void CmExtremeVertexUtil::mAddConstraints(int q, int numConstraints, unsigned in
     std::copy(region.planes().begin(), region.planes().end(), planes.data());
     // The old table goes before the new one is made: it is the larger part of the memory.
     slack = matrix<double>();
-    points = matrix<double>();
-    slack = tableOfValues(region.planes().data(), region.numPlanes(), region.points().data(), region.numVertices(),
-                          columns);
-    points = matrix<double>(region.takePoints(), q);
+    points = matrix<double>(std::move(region).takePoints(), q);
+    slack = tableOfValues(planes.data(), static_cast<std::size_t>(*numPlanes), points.data(), *numVertices, columns);
 }
 
 void CmExtremeVertexUtil::mEdge(int a, int b, int q, unsigned int* numVertices, int numPlanes, matrix<double>& points,

@@ -1,10 +1,11 @@
 #include "mixture/face_centroids.h"
 
 #include <algorithm>
-#include <bit>
+#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <limits>
+#include <span>
 #include <stdexcept>
 #include <utility>
 
@@ -17,102 +18,103 @@ namespace {
 
 using qan::matrix_library::matrix;
 
-/// Rows of q values in blocks of about a megabyte. A single array that doubles would hold its contents twice while it
-/// grows.
-class RowBlocks {
+/// Collects the points of a design: its vertices, then the distinct centroids of faces, up to a limit.
+///
+/// A new centroid waits while a few more are computed, so that the index has time to fetch what it compares with.
+class PointCollector {
   public:
-    explicit RowBlocks(std::size_t q) : q_(q), rowsPerBlock_(std::bit_floor(std::max<std::size_t>(1, kBlock / q))) {}
-
-    std::size_t count() const { return count_; }
-
-    const double* row(std::size_t i) const { return &blocks_[i / rowsPerBlock_][i % rowsPerBlock_ * q_]; }
-
-    void append(const double* values) {
-        if (count_ % rowsPerBlock_ == 0) {
-            blocks_.emplace_back();
-            blocks_.back().reserve(rowsPerBlock_ * q_);
-        }
-        blocks_.back().insert(blocks_.back().end(), values, values + q_);
-        ++count_;
+    /// @param room the number of points to expect
+    PointCollector(const matrix<double>& vertices, std::size_t q, std::size_t room, int maxPoints)
+        : q_(q), maxPoints_(maxPoints), waitingPoints_(kMostWaiting * q), index_(q) {
+        const std::size_t numVertices = static_cast<std::size_t>(vertices.rowCount());
+        rows_.reserve(room * q);
+        rows_.insert(rows_.end(), vertices.data(), vertices.data() + numVertices * q);
+        index_.reserve(room - numVertices);
     }
 
-    /// Moves all rows to the end of an array that has room for them.
-    void moveTo(std::vector<double>& rows) {
-        for (std::vector<double>& block : blocks_) {
-            rows.insert(rows.end(), block.begin(), block.end());
-            std::vector<double>().swap(block);
-        }
-        blocks_.clear();
-        count_ = 0;
+    std::size_t count() const { return rows_.size() / q_; }
+    matrix<double> takePoints() { return matrix<double>(std::move(rows_), static_cast<int>(q_)); }
+
+    /// @return false when a centroid is new and beyond the limit
+    bool addCentroid(std::span<const FaceWalk::Member> face) {
+        if (numWaiting_ == kMostWaiting && !settleOldest()) return false;
+        const std::size_t slot = (oldest_ + numWaiting_++) % kMostWaiting;
+        double* const point = &waitingPoints_[slot * q_];
+        mAvgExtremeVertices(face, point);
+        waitingPlaces_[slot] = index_.place(point);
+        index_.prefetch(waitingPlaces_[slot]);
+        return true;
     }
 
-  private:
-    static constexpr std::size_t kBlock = std::size_t{1} << 17U;
-
-    std::size_t q_;
-    std::size_t rowsPerBlock_;
-    std::size_t count_ = 0;
-    std::vector<std::vector<double>> blocks_;
-};
-
-/// Collects the distinct centroids of faces, up to a limit on all points.
-class Centroids {
-  public:
-    Centroids(const double* vertices, std::size_t numVertices, std::size_t q, int maxPoints)
-        : vertices_(vertices), numVertices_(numVertices), q_(q), maxPoints_(maxPoints), mean_(q), rows_(q), index_(q) {}
-
-    std::size_t count() const { return rows_.count(); }
-    RowBlocks& rows() { return rows_; }
-
-    /// @return false when the centroid is new and beyond the limit
-    bool add(const FaceWalk::Vertices& face) {
-        mAvgExtremeVertices(face);
-        const PointIndex::Place place = index_.place(mean_.data());
-        const auto isSame = [this](std::uint32_t i) { return isSamePoint(rows_.row(i), mean_.data(), q_); };
-        if (index_.contains(place, isSame)) return true;
-        const std::size_t numPoints = numVertices_ + count() + 1;
-        if (static_cast<std::int64_t>(numPoints) > maxPoints_) return false;
-        if (numPoints > static_cast<std::size_t>(std::numeric_limits<int>::max()) / q_)
-            throw std::length_error("more points than a matrix holds");
-        index_.insert(place, static_cast<std::uint32_t>(count()));
-        rows_.append(mean_.data());
+    /// Takes in the centroids that wait.
+    /// @return as addCentroid()
+    bool settle() {
+        while (numWaiting_ > 0)
+            if (!settleOldest()) return false;
         return true;
     }
 
   private:
-    /// The mean of the vertices, each sum formed in their order.
-    void mAvgExtremeVertices(const FaceWalk::Vertices& face) {
-        std::size_t j = 0;
-        for (; j + 8 <= q_; j += 8)
-            averageColumns<8>(face, j);
-        for (; j + 2 <= q_; j += 2)
-            averageColumns<2>(face, j);
-        for (; j < q_; ++j)
-            averageColumns<1>(face, j);
-    }
+    static constexpr std::size_t kMostWaiting = 16;
 
-    /// A few columns at a time, so that their sums stay in registers.
-    template <std::size_t Width>
-    void averageColumns(const FaceWalk::Vertices& face, std::size_t column) {
-        double sums[Width] = {};
-        for (const std::uint32_t vertex : face) {
-            const double* const values = vertices_ + vertex * q_ + column;
-            for (std::size_t i = 0; i < Width; ++i)
-                sums[i] += values[i];
+    /// The mean of the vertices; the sums are formed in their order.
+    void mAvgExtremeVertices(std::span<const FaceWalk::Member> face, double* __restrict mean) const {
+        const double* const vertices = rows_.data();
+        std::fill_n(mean, q_, 0.0);
+        for (const FaceWalk::Member& member : face) {
+            const double* const vertex = vertices + member.vertex * q_;
+            for (std::size_t j = 0; j < q_; ++j)
+                mean[j] += vertex[j];
         }
         const auto count = static_cast<double>(face.size());
-        for (std::size_t i = 0; i < Width; ++i)
-            mean_[column + i] = sums[i] / count;
+        for (std::size_t j = 0; j < q_; ++j)
+            mean[j] /= count;
     }
 
-    const double* vertices_;
-    std::size_t numVertices_;
+    bool settleOldest() {
+        const double* const point = &waitingPoints_[oldest_ * q_];
+        const PointIndex::Place& place = waitingPlaces_[oldest_];
+        oldest_ = (oldest_ + 1) % kMostWaiting;
+        --numWaiting_;
+        const auto isSame = [&](std::uint32_t row) { return isSamePoint(&rows_[row * q_], point, q_); };
+        if (index_.contains(place, isSame)) return true;
+
+        const std::size_t row = count();
+        if (static_cast<std::int64_t>(row) >= maxPoints_) return false;
+        if (row >= static_cast<std::size_t>(std::numeric_limits<int>::max()) / q_)
+            throw std::length_error("more points than a matrix holds");
+        index_.insert(place, static_cast<std::uint32_t>(row));
+        rows_.insert(rows_.end(), point, point + q_);
+        return true;
+    }
+
     std::size_t q_;
     std::int64_t maxPoints_;
-    std::vector<double> mean_;
-    RowBlocks rows_;
+    std::vector<double> rows_;
+    std::size_t oldest_ = 0;
+    std::size_t numWaiting_ = 0;
+    std::vector<double> waitingPoints_;
+    std::array<PointIndex::Place, kMostWaiting> waitingPlaces_{};
     PointIndex index_;
 };
+
+std::size_t planesOfFace(int q, int dimension) {
+    return static_cast<std::size_t>(q - 1 - dimension);
+}
+
+std::size_t verticesOfFace(int dimension) {
+    return static_cast<std::size_t>(dimension) + 1;
+}
+
+/// The number of points of the design, or more, but no more than the limit and what a matrix holds.
+std::size_t expectPoints(FaceWalk& walk, int q, int numDimensions, int numVertices, int maxPoints) {
+    const auto most =
+        static_cast<std::size_t>(std::max(numVertices, std::min(maxPoints, std::numeric_limits<int>::max() / q)));
+    auto room = static_cast<std::size_t>(numVertices);
+    for (int dimension = 1; dimension < numDimensions; ++dimension)
+        room = std::min(most, room + walk.count(planesOfFace(q, dimension), verticesOfFace(dimension), most - room));
+    return room;
+}
 
 }  // namespace
 
@@ -126,25 +128,25 @@ bool mCalculateCentroidsControl(int numPlanes, int& numCentroids, int degree, in
 
     const auto columns = static_cast<std::size_t>(q);
     const auto vertices = static_cast<std::size_t>(numVertices);
-    FaceWalk walk(slack.data(), vertices, static_cast<std::size_t>(numPlanes));
-    Centroids centroids(points.data(), vertices, columns, maxPoints);
+    FaceWalk walk(columns, slack.data(), vertices, static_cast<std::size_t>(numPlanes));
+    // Counting first costs less than letting the array of points grow, which would hold it twice.
+    const std::size_t room = expectPoints(walk, q, numDimensions, numVertices, maxPoints);
+    PointCollector collector(points, columns, room, maxPoints);
+    points = matrix<double>();
+
     bool withinLimit = true;
     for (int dimension = 1; withinLimit && dimension < numDimensions; ++dimension) {
-        withinLimit = walk.walk(static_cast<std::size_t>(q - 1 - dimension), static_cast<std::size_t>(dimension) + 1,
-                                [&](const FaceWalk::Vertices& face) { return centroids.add(face); });
+        withinLimit = walk.walk(planesOfFace(q, dimension), verticesOfFace(dimension),
+                                [&](std::span<const FaceWalk::Member> face) { return collector.addCentroid(face); }) &&
+                      collector.settle();
         if (!withinLimit) break;
-        const std::size_t numTyped = vertices + centroids.count();
-        if (pointTypes.size() < numTyped) pointTypes.resize(numTyped, 1);
+        if (pointTypes.size() < collector.count()) pointTypes.resize(collector.count(), 1);
         std::fill(pointTypes.begin() + (numVertices + numCentroids),
-                  pointTypes.begin() + static_cast<std::ptrdiff_t>(numTyped), dimension + 1 == q ? 0 : dimension + 1);
-        numCentroids = static_cast<int>(centroids.count());
+                  pointTypes.begin() + static_cast<std::ptrdiff_t>(collector.count()),
+                  dimension + 1 == q ? 0 : dimension + 1);
+        numCentroids = static_cast<int>(collector.count() - vertices);
     }
-
-    std::vector<double> rows;
-    rows.reserve((vertices + centroids.count()) * columns);
-    rows.insert(rows.end(), points.data(), points.data() + vertices * columns);
-    centroids.rows().moveTo(rows);
-    points = matrix<double>(std::move(rows), q);
+    points = collector.takePoints();
     return withinLimit;
 }
 

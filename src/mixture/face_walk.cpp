@@ -21,8 +21,8 @@ std::uint64_t foldedBit(std::uint32_t plane) {
 
 }  // namespace
 
-FaceWalk::FaceWalk(const double* slack, std::size_t numVertices, std::size_t numPlanes)
-    : numVertices_(numVertices), numPlanes_(numPlanes), folded_(numVertices), places_(numPlanes, 0) {
+FaceWalk::FaceWalk(std::size_t q, const double* slack, std::size_t numVertices, std::size_t numPlanes)
+    : q_(q), numVertices_(numVertices), numPlanes_(numPlanes), folded_(numVertices), places_(numPlanes, 0) {
     if (numPlanes > 0 && numVertices >= std::numeric_limits<std::uint32_t>::max() / numPlanes)
         throw std::length_error("more slacks than a matrix holds");
     all_.begin.reserve(numVertices + 1);
@@ -34,22 +34,43 @@ FaceWalk::FaceWalk(const double* slack, std::size_t numVertices, std::size_t num
     }
 }
 
-void FaceWalk::begin(std::size_t setSize, std::size_t minVertices) {
+std::size_t FaceWalk::count(std::size_t setSize, std::size_t minVertices, std::size_t limit) {
+    begin(setSize, minVertices, true);
+    std::size_t count = 0;
+    while (count < limit) {
+        const Level* const last = nextLastLevel();
+        if (last == nullptr) break;
+        count += last->children.size();
+    }
+    return count;
+}
+
+void FaceWalk::begin(std::size_t setSize, std::size_t minVertices, bool isCounting) {
     setSize_ = setSize;
     minVertices_ = minVertices;
+    isCounting_ = isCounting;
     depth_ = 0;
     covered_.clear();
-    isWholeRegionDue_ = setSize == 0 && numVertices_ >= minVertices;
-    if (setSize == 0 || setSize > numPlanes_) return;
+    if (setSize > numPlanes_) return;
 
     dropIdlePlanes();
-    if (levels_.size() < setSize) levels_.resize(setSize);
     std::vector<Member> members(numVertices_);
     for (std::uint32_t v = 0; v < numVertices_; ++v)
         members[v] = {v, lists_.begin[v]};
-    levels_[0].foldedBranch = 0;
-    expand(members.data(), members.data() + members.size(), setSize, levels_[0]);
+    if (levels_.size() <= setSize) levels_.resize(setSize + 1);
+    Level& root = levels_[0];
+    root.foldedBranch = 0;
+    root.next = 0;
     depth_ = 1;
+    if (setSize > 0) {
+        expand(members, setSize, root);
+    } else if (numVertices_ >= minVertices) {
+        // The set without planes holds everywhere; it stands as the child of a branch that it has not.
+        root.members.swap(members);
+        root.children.assign(1, {0, 0, numVertices_});
+    } else {
+        root.children.clear();
+    }
 }
 
 /// Fills lists_ with the planes that enough vertices share, as long as the vertices lie on enough such planes.
@@ -74,47 +95,37 @@ void FaceWalk::dropIdlePlanes() {
     }
 }
 
-/// Goes on to the next complete set and leaves its vertices in face_.
-/// @return false when there is none
-bool FaceWalk::next() {
-    if (isWholeRegionDue_) {
-        isWholeRegionDue_ = false;
-        face_.resize(numVertices_);
-        for (std::uint32_t v = 0; v < numVertices_; ++v)
-            face_[v] = v;
-        return true;
-    }
+/// Goes on to the next branch whose children complete the set.
+/// @return its level, null when there is none
+FaceWalk::Level* FaceWalk::nextLastLevel() {
     while (depth_ > 0) {
         Level& level = levels_[depth_ - 1];
         if (level.next == level.children.size()) {
             --depth_;
             continue;
         }
+        if (depth_ >= setSize_) {
+            level.next = level.children.size();
+            return &level;
+        }
         const Child child = level.children[level.next++];
         const std::size_t missing = setSize_ - depth_;
         if (wasCovered(level, child, missing)) continue;
-        const Member* const members = level.members.data();
-        if (missing == 0) {
-            face_.clear();
-            for (std::size_t i = child.begin; i < child.end; ++i)
-                face_.push_back(members[i].vertex);
-            return true;
-        }
         Level& deeper = levels_[depth_++];
         deeper.foldedBranch = level.foldedBranch | foldedBit(child.plane);
-        expand(members + child.begin, members + child.end, missing, deeper);
+        expand(membersOf(level, child), missing, deeper);
     }
-    return false;
+    return nullptr;
 }
 
 /// Finds the planes by which a branch that lacks `missing` planes can go on, and the vertices on each.
-void FaceWalk::expand(const Member* first, const Member* last, std::size_t missing, Level& level) {
+void FaceWalk::expand(std::span<const Member> branch, std::size_t missing, Level& level) {
     const std::uint32_t* const planes = lists_.planes.data();
     std::size_t lowest = numPlanes_;
     std::size_t highest = 0;
-    for (const Member* member = first; member != last; ++member) {
-        const std::size_t end = lists_.begin[member->vertex + 1];
-        for (std::size_t i = member->later; i + missing <= end; ++i) {
+    for (const Member& member : branch) {
+        const std::size_t end = lists_.begin[member.vertex + 1];
+        for (std::size_t i = member.later; i + missing <= end; ++i) {
             ++places_[planes[i]];
             lowest = std::min<std::size_t>(lowest, planes[i]);
             highest = std::max<std::size_t>(highest, planes[i]);
@@ -133,12 +144,14 @@ void FaceWalk::expand(const Member* first, const Member* last, std::size_t missi
         total += count;
     }
 
-    level.members.resize(total);
-    for (const Member* member = first; member != last; ++member) {
-        const std::size_t end = lists_.begin[member->vertex + 1];
-        for (std::size_t i = member->later; i + missing <= end; ++i) {
+    const bool needsMembers = missing > 1 || !isCounting_;
+    if (needsMembers && level.members.size() < total) level.members.resize(total);
+    for (std::size_t m = 0; needsMembers && m < branch.size(); ++m) {
+        const Member member = branch[m];
+        const std::size_t end = lists_.begin[member.vertex + 1];
+        for (std::size_t i = member.later; i + missing <= end; ++i) {
             std::size_t& place = places_[planes[i]];
-            if (place != kIdle) level.members[place++] = {member->vertex, static_cast<std::uint32_t>(i + 1)};
+            if (place != kIdle) level.members[place++] = {member.vertex, static_cast<std::uint32_t>(i + 1)};
         }
     }
     for (std::size_t plane = lowest; plane <= highest; ++plane)
@@ -149,26 +162,24 @@ void FaceWalk::expand(const Member* first, const Member* last, std::size_t missi
 /// same vertices; what follows from such a branch depends only on its vertices, on how many planes it lacks and on the
 /// plane behind which it looks for them. Without this a few planes through one face would multiply its work by the
 /// number of ways to choose among them.
-bool FaceWalk::wasCovered(const Level& level, const Child& child, std::size_t missing) {
-    const std::uint64_t branch = level.foldedBranch | foldedBit(child.plane);
-    const auto first = level.members.begin() + static_cast<std::ptrdiff_t>(child.begin);
-    const auto last = level.members.begin() + static_cast<std::ptrdiff_t>(child.end);
-    std::uint64_t common = ~std::uint64_t{0};
-    for (auto member = first; member != last && (common & ~branch) != 0; ++member)
-        common &= folded_[member->vertex];
+bool FaceWalk::wasCovered(std::span<const Member> members, std::uint64_t foldedBranch, std::uint32_t plane,
+                          std::size_t missing) {
+    std::uint64_t others = ~(foldedBranch | foldedBit(plane));
+    for (std::size_t i = 0; i < members.size() && others != 0; ++i)
+        others &= folded_[members[i].vertex];
     // Another branch with these vertices would need a plane that they share and this branch lacks.
-    if ((common & ~branch) == 0) return false;
+    if (others == 0) return false;
 
     BranchKey key{mixBits(missing), mixBits(~missing)};
-    for (auto member = first; member != last; ++member) {
-        key.first = mixBits(key.first ^ member->vertex);
-        key.second = mixBits(key.second + member->vertex);
+    for (const Member& member : members) {
+        key.first = mixBits(key.first ^ member.vertex);
+        key.second = mixBits(key.second + member.vertex);
     }
     if (const auto known = covered_.find(key); known != covered_.end()) {
-        if (known->second <= child.plane) return true;
-        known->second = child.plane;
+        if (known->second <= plane) return true;
+        known->second = plane;
     } else if (covered_.size() < kMostCovered) {
-        covered_.emplace(key, child.plane);
+        covered_.emplace(key, plane);
     }
     return false;
 }

@@ -1,6 +1,8 @@
 #ifndef REISTI_MIXTURE_ID_TABLE_H
 #define REISTI_MIXTURE_ID_TABLE_H
 
+#include <algorithm>
+#include <bit>
 #include <cstddef>
 #include <cstdint>
 #include <vector>
@@ -29,6 +31,18 @@ class IdTable {
         ++count_;
     }
 
+    /// Makes room for so many ids in all.
+    void reserve(std::size_t count) {
+        const std::size_t size = std::bit_ceil(2 * count);
+        if (size > slots_.size()) resize(std::max(size, kFirstSize));
+    }
+
+    /// Fetches the slots of a hash into the cache, for a look-up a little later: most of the time of a look-up in a
+    /// large table is the wait for them.
+    void prefetch(std::uint64_t hash) const {
+        if (!slots_.empty()) __builtin_prefetch(&slots_[fold(hash) & mask_]);
+    }
+
     /// Calls match(id) for every id filed under the hash, and perhaps for others, until it returns true.
     /// @return whether it did
     template <typename Match>
@@ -55,8 +69,10 @@ class IdTable {
         slots_[i] = slot;
     }
 
-    void grow() {
-        std::vector<Slot> old(slots_.empty() ? kFirstSize : 2 * slots_.size());
+    void grow() { resize(slots_.empty() ? kFirstSize : 2 * slots_.size()); }
+
+    void resize(std::size_t size) {
+        std::vector<Slot> old(size);
         old.swap(slots_);
         mask_ = slots_.size() - 1;
         for (const Slot& slot : old)

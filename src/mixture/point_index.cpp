@@ -31,10 +31,22 @@ PointIndex::Place PointIndex::place(const double* point) const {
     return place;
 }
 
-void PointIndex::insert(const Place& place, std::uint32_t id) {
-    Place cell;
+namespace {
+
+PointIndex::Place cellOf(const PointIndex::Place& place) {
+    PointIndex::Place cell;
     std::transform(place.begin(), place.end(), cell.begin(), [](double coordinate) { return std::floor(coordinate); });
-    table_.insert(hashOfCell(cell), id);
+    return cell;
+}
+
+}  // namespace
+
+void PointIndex::insert(const Place& place, std::uint32_t id) {
+    table_.insert(hashOfCell(cellOf(place)), id);
+}
+
+void PointIndex::prefetch(const Place& place) const {
+    table_.prefetch(hashOfCell(cellOf(place)));
 }
 
 std::uint64_t PointIndex::hashOfCell(const Place& cell) {

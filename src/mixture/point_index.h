@@ -37,6 +37,12 @@ class PointIndex {
 
     void insert(const Place& place, std::uint32_t id);
 
+    /// Makes room for so many points in all.
+    void reserve(std::size_t count) { table_.reserve(count); }
+
+    /// Announces a look-up a little later.
+    void prefetch(const Place& place) const;
+
     /// Calls same(id) for points filed near a place until it returns true.
     /// @return whether it did; never for a place with a NaN, which is near to nothing
     template <typename Same>
