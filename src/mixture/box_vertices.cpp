@@ -21,7 +21,8 @@ constexpr double kWalkSlack = 1e-10;
 constexpr double kSureTie = 0.5 * kSameVertexAbsolute;
 constexpr double kTrustedRounding = 0.45 * kSameVertexAbsolute;
 
-/// With all ranges above this, vertices that agree within kSameVertexAbsolute agree in which bounds they touch.
+/// With all ranges above this (none negative, then), vertices that agree within kSameVertexAbsolute agree in which
+/// bounds they touch.
 constexpr double kDistinctRange = 4 * kSameVertexAbsolute;
 
 /// Lowest positions of the list whose sums are tabled: at most 2^8 sums.
@@ -130,6 +131,7 @@ class BoxVertexWalk {
   private:
     void tableLowSums();
     void set(std::size_t position, bool upper);
+    double roomFor(std::size_t position, bool belowLower) const;
     bool canYieldVertex() const;
     void visitCombination();
     void visitRepairs(double freeValue, bool belowLower);
@@ -150,6 +152,8 @@ class BoxVertexWalk {
     std::size_t free_;
     double freeLower_;
     double freeUpper_;
+    double freeLeast_;
+    double freeMost_;
 
     // By position of the list, over the positions below it:
     std::vector<double> lowerBelow_;
@@ -159,6 +163,7 @@ class BoxVertexWalk {
 
     std::size_t level_;
     std::vector<double> range_;
+    std::vector<char> inverted_;
     std::vector<double> setting_;
     std::vector<char> upper_;
     std::vector<double> sum_;
@@ -186,12 +191,15 @@ BoxVertexWalk::BoxVertexWalk(std::size_t q, const double* lower, const double* u
       free_(order_.back()),
       freeLower_(lower[free_]),
       freeUpper_(upper[free_]),
+      freeLeast_(std::min(freeLower_, freeUpper_)),
+      freeMost_(std::max(freeLower_, freeUpper_)),
       lowerBelow_(q, 0.0),
       upperBelow_(q, 0.0),
       widestBelow_(q, 0.0),
       narrowestBelow_(q, std::numeric_limits<double>::infinity()),
       level_(fixed_),
       range_(fixed_),
+      inverted_(fixed_, 0),
       setting_(fixed_),
       upper_(fixed_, 0),
       sum_(q, 0.0),
@@ -203,9 +211,11 @@ BoxVertexWalk::BoxVertexWalk(std::size_t q, const double* lower, const double* u
       vertices_(q, lower, upper) {
     for (std::size_t p = 0; p < fixed_; ++p) {
         const std::size_t component = order_[p];
-        range_[p] = upper[component] - lower[component];
-        lowerBelow_[p + 1] = lowerBelow_[p] + lower[component];
-        upperBelow_[p + 1] = upperBelow_[p] + upper[component];
+        // The check of the bounds lets a negative upper bound lie a hair below the lower one.
+        range_[p] = std::fabs(upper[component] - lower[component]);
+        inverted_[p] = upper[component] < lower[component] ? 1 : 0;
+        lowerBelow_[p + 1] = lowerBelow_[p] + std::min(lower[component], upper[component]);
+        upperBelow_[p + 1] = upperBelow_[p] + std::max(lower[component], upper[component]);
         widestBelow_[p + 1] = std::max(widestBelow_[p], range_[p]);
         narrowestBelow_[p + 1] = std::min(narrowestBelow_[p], range_[p]);
     }
@@ -255,8 +265,8 @@ void BoxVertexWalk::set(std::size_t position, bool upper) {
     upper_[position] = upper ? 1 : 0;
     setting_[position] = upper ? upperBound_[component] : lowerBound_[component];
     sum_[position] = sum_[position + 1] + setting_[position];
-    widestAtLower_[position] = std::max(widestAtLower_[position + 1], upper ? 0.0 : range_[position]);
-    widestAtUpper_[position] = std::max(widestAtUpper_[position + 1], upper ? range_[position] : 0.0);
+    widestAtLower_[position] = std::max(widestAtLower_[position + 1], roomFor(position, false));
+    widestAtUpper_[position] = std::max(widestAtUpper_[position + 1], roomFor(position, true));
     setBit(atUpper_, component, upper);
     if (position < tabled_) {
         const std::size_t bit = std::size_t{1} << position;
@@ -264,16 +274,21 @@ void BoxVertexWalk::set(std::size_t position, bool upper) {
     }
 }
 
+/// How far a component can move off its bound to make up for what the free component is too low or too high.
+double BoxVertexWalk::roomFor(std::size_t position, bool belowLower) const {
+    return inverted_[position] != 0 || (upper_[position] != 0) == belowLower ? range_[position] : 0.0;
+}
+
 /// Whether a combination within reach puts the free component within its bounds, or outside by no more than one
 /// component can make up for.
 bool BoxVertexWalk::canYieldVertex() const {
     const double gain = std::max(widestAtLower_[level_], widestBelow_[level_]);
     const double highest = sum_[level_] + upperBelow_[level_];
-    if (highest < 1.0 - freeUpper_ - gain - kWalkSlack) return false;
+    if (highest < 1.0 - freeMost_ - gain - kWalkSlack) return false;
 
     const double loss = std::max(widestAtUpper_[level_], widestBelow_[level_]);
     const double lowest = sum_[level_] + lowerBelow_[level_];
-    const double limit = 1.0 - freeLower_ + loss;
+    const double limit = 1.0 - freeLeast_ + loss;
     if (lowest > limit + kWalkSlack) return false;
     // The repair would take the component from its upper to its lower bound: an earlier combination has been there.
     return narrow_ || std::fabs(lowest - limit) > kSureTie || loss <= 3 * kWalkSlack ||
@@ -315,8 +330,7 @@ void BoxVertexWalk::visitRepairs(double freeValue, bool belowLower) {
     const double freeBound = belowLower ? freeLower_ : freeUpper_;
     const double excess = std::fabs(freeValue - freeBound);
     for (std::size_t p = 0; p < fixed_; ++p) {
-        // A component makes up for the excess by moving off the bound at which it is, across its range at most.
-        const double room = (upper_[p] != 0) == belowLower ? range_[p] : 0.0;
+        const double room = roomFor(p, belowLower);
         if (excess > room + kWalkSlack) continue;
         // As in canYieldVertex().
         if (belowLower && !narrow_ && room > 3 * kWalkSlack && std::fabs(excess - room) <= kSureTie) continue;
