@@ -1,6 +1,6 @@
 #include <fstream>
 #include <gtest/gtest.h>
-#include <regex>
+#include <sstream>
 #include <string>
 
 #include "reisti/reisti.h"
@@ -15,7 +15,16 @@ TEST(Version, IsTheFirstLineOfTheVersionFile) {
 }
 
 TEST(Version, IsThreeNumbers) {
-    EXPECT_TRUE(std::regex_match(des_Version(), std::regex(R"(\d+\.\d+\.\d+)"))) << des_Version();
+    std::istringstream text(des_Version());
+    unsigned major = 0;
+    unsigned minor = 0;
+    unsigned patch = 0;
+    char firstDot = 0;
+    char secondDot = 0;
+    ASSERT_TRUE(text >> major >> firstDot >> minor >> secondDot >> patch) << des_Version();
+    EXPECT_EQ(firstDot, '.');
+    EXPECT_EQ(secondDot, '.');
+    EXPECT_TRUE(text.eof()) << "something follows the number of the patch";
 }
 
 }  // namespace

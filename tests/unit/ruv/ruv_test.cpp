@@ -16,6 +16,8 @@
 
 #include "support/scale.h"
 
+extern "C" double firstNumberInC(double seed);
+
 namespace {
 
 using reisti::test::scaled;
@@ -136,6 +138,10 @@ TEST(Sampler, OtherSamplersDoNotDisturbIt) {
     EXPECT_EQ(numbers, draw(3.5, 10));
 }
 
+TEST(Sampler, GivesCTheSameNumbers) {
+    EXPECT_EQ(firstNumberInC(3.5), draw(3.5, 1).front());
+}
+
 TEST(UniformSample, NumbersOfTheUnitIntervalCarry53Bits) {
     bool oddSeen = false;
     for (const double value : draw(77.0, 10000)) {
@@ -179,7 +185,8 @@ INSTANTIATE_TEST_SUITE_P(, UniformSampleBounds,
                                          Bounds{"OneUlpWide", 1.0, std::nextafter(1.0, 2.0)},
                                          Bounds{"FewUlpsWide", 1e16, 1e16 + 8}, Bounds{"OneDenormalWide", 0.0, 5e-324},
                                          Bounds{"LargeNarrow", 4503599627370496.0, 4503599627370497.0},
-                                         Bounds{"Huge", -8e307, 8e307}),
+                                         Bounds{"Huge", -8e307, 8e307},
+                                         Bounds{"WiderThanAnyNumber", -1.7e308, 1.7e308}),
                          [](const testing::TestParamInfo<Bounds>& param) { return std::string(param.param.name); });
 
 TEST(UniformSample, FillsTheIntervalEvenly) {
