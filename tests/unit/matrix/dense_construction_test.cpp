@@ -1,5 +1,6 @@
 #include <cstdint>
 #include <type_traits>
+#include <utility>
 
 #include "unit/matrix/matrix_kinds.h"
 
@@ -40,6 +41,23 @@ TEST(DenseConstruction, MatrixWithoutRowsOrWithoutColumnsIsEmptyButKeepsTheOther
 
 TEST(DenseConstruction, VectorIsReadRowByRow) {
     const Dense m(Vec{1, 2, 3, 4, 5, 6}, 3);
+    EXPECT_EQ(plain(m), (PlainMatrix{{1, 2, 3}, {4, 5, 6}}));
+}
+
+TEST(DenseConstruction, VectorThatIsKeptIsCopied) {
+    const Vec elements{1, 2, 3, 4, 5, 6};
+    Dense m(elements, 3);
+    m(0, 0) = 9.0;
+    EXPECT_EQ(elements[0], 1.0);
+    EXPECT_EQ(m(1, 2), 6.0);
+    EXPECT_EQ(m.rowCount(), 2);
+}
+
+TEST(DenseConstruction, VectorThatIsGivenAwayKeepsItsStorage) {
+    Vec elements{1, 2, 3, 4, 5, 6};
+    const double* const storage = elements.data();
+    Dense m(std::move(elements), 3);
+    EXPECT_EQ(&m(0, 0), storage);
     EXPECT_EQ(plain(m), (PlainMatrix{{1, 2, 3}, {4, 5, 6}}));
 }
 
@@ -84,7 +102,9 @@ TEST(DenseConstruction, RowVectorOfNothingDoesNotDivideByZero) {
 }
 
 TEST(DenseConstruction, VectorWithZeroColumnsDoesNotDivideByZero) {
+    const Vec elements{1, 2};
     try {
+        EXPECT_TRUE(Dense(elements, 0).empty());
         EXPECT_TRUE(Dense(Vec{1, 2}, 0).empty());
     } catch (const MatrixException&) {
         SUCCEED();

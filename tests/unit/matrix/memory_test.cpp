@@ -23,6 +23,9 @@ constexpr std::ptrdiff_t kColumnBytes = 20000 * sizeof(double);
 /// A handful of vectors of the outer dimension; the product itself would take 3.2 gigabytes.
 constexpr std::ptrdiff_t kAFewColumns = 6 * kColumnBytes + 65536;
 
+/// Products may pack tiles of their operands into buffers whose size does not depend on the order.
+constexpr std::ptrdiff_t kPackingBuffers = std::ptrdiff_t{2} * 1024 * 1024;
+
 class LargeProduct : public testing::Test {
   protected:
     LargeProduct() {
@@ -110,7 +113,7 @@ TYPED_TEST(PackedValueExpression, RowAndColumnFormNoDenseCopy) {
         column = ex::GetColumn(value, 1499);
         row = ex::GetRow(value, 0);
     });
-    EXPECT_LE(counts.peakBytes, 10 * 1500 * std::ptrdiff_t{sizeof(double)} + 65536);
+    EXPECT_LE(counts.peakBytes, kPackingBuffers) << "a dense copy takes 18 megabytes";
     EXPECT_EQ(column(3, 0), 2.0);
     EXPECT_EQ(row(0, 3), 2.0);
 }
@@ -131,8 +134,7 @@ TYPED_TEST(StructuredOperand, IsNeverCopiedIntoADenseMatrixForAProduct) {
         right = structured * column;
         left = row * structured;
     });
-    // Results, and packing buffers of a fixed size; a dense copy takes 18 megabytes.
-    EXPECT_LE(counts.peakBytes, std::ptrdiff_t{4} * 1024 * 1024);
+    EXPECT_LE(counts.peakBytes, kPackingBuffers) << "a dense copy takes 18 megabytes";
     EXPECT_EQ(plain(right), plain(column));
     EXPECT_EQ(plain(left), plain(row));
 }
