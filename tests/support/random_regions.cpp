@@ -83,6 +83,38 @@ void RegionMaker::nudgeByUlps(std::vector<double>& bounds) {
     }
 }
 
+void RegionMaker::besideTies(std::size_t q, std::vector<double>& lower, std::vector<double>& upper) {
+    decimalBounds(q, oneIn(2) ? 1 : 2, lower, upper);
+    const auto offset = [&] { return 2.5e-13 * (static_cast<double>(below(21)) - 10.0); };
+    for (std::size_t j = 0; j < q; ++j) {
+        if (oneIn(2)) lower[j] += offset();
+        if (oneIn(2)) upper[j] += offset();
+    }
+}
+
+void RegionMaker::withTinyComponents(std::size_t q, std::vector<double>& lower, std::vector<double>& upper) {
+    decimalBounds(q, 1, lower, upper);
+    for (std::size_t j = 0; j < q; ++j) {
+        if (!oneIn(2)) continue;
+        upper[j] = static_cast<double>(1 + below(9)) * std::pow(10.0, -4.0 - static_cast<double>(below(10)));
+        lower[j] = oneIn(2) ? 0.0 : upper[j] * (1.0 - 1.5e-5 * std::pow(10.0, static_cast<double>(below(4))));
+    }
+}
+
+void RegionMaker::tinyRegion(std::size_t q, std::vector<double>& lower, std::vector<double>& upper) {
+    lower.assign(q, 0.0);
+    upper.assign(q, 1.0);
+    std::vector<double> centre(q);
+    double sum = 0.0;
+    for (double& x : centre)
+        sum += x = 0.2 + uniform();
+    for (std::size_t j = 0; j < q; ++j) {
+        const double middle = centre[j] / sum;
+        lower[j] = middle - 1e-5 * (1.0 + static_cast<double>(below(5)));
+        upper[j] = middle + 1e-5 * (1.0 + static_cast<double>(below(5)));
+    }
+}
+
 void RegionMaker::bounds(std::size_t q, std::vector<double>& lower, std::vector<double>& upper) {
     unsortedBounds(q, lower, upper);
     for (std::size_t j = 0; j < q; ++j)
@@ -90,7 +122,7 @@ void RegionMaker::bounds(std::size_t q, std::vector<double>& lower, std::vector<
 }
 
 void RegionMaker::unsortedBounds(std::size_t q, std::vector<double>& lower, std::vector<double>& upper) {
-    switch (below(10)) {
+    switch (below(14)) {
         case 0:
         case 1:
             return decimalBounds(q, 2, lower, upper);
@@ -123,6 +155,17 @@ void RegionMaker::unsortedBounds(std::size_t q, std::vector<double>& lower, std:
                 if (oneIn(3)) lower[j] = upper[j] - ranges[below(7)];
             return;
         }
+        case 9:
+            return besideTies(q, lower, upper);
+        case 10:
+            return withTinyComponents(q, lower, upper);
+        case 11:
+            return tinyRegion(q, lower, upper);
+        case 12:
+            decimalBounds(q, 2, lower, upper);
+            for (double& x : lower)
+                if (oneIn(2)) x = -typed(0.6 * uniform(), 1);
+            return;
         default:
             lower.assign(q, 0.0);
             upper.assign(q, 1.0);

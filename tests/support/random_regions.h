@@ -27,6 +27,13 @@ class RegionMaker {
     /// Lower bounds 0 to 0.1, upper bounds 0.2 to 0.6.
     void typicalBounds(std::size_t q, std::vector<double>& lower, std::vector<double>& upper);
 
+    /// Decimals moved by a few quarters of the tolerance within which bounds are met.
+    void besideTies(std::size_t q, std::vector<double>& lower, std::vector<double>& upper);
+    /// Some components hardly matter: upper bounds from 1e-3 down to 1e-13.
+    void withTinyComponents(std::size_t q, std::vector<double>& lower, std::vector<double>& upper);
+    /// All ranges a few 1e-5, where points that differ are one to the search for centroids.
+    void tinyRegion(std::size_t q, std::vector<double>& lower, std::vector<double>& upper);
+
     /// A constraint on the region within the bounds; `earlier` ones may be repeated or opposed.
     PlainConstraint constraint(const std::vector<double>& lower, const std::vector<double>& upper, double total,
                                const std::vector<PlainConstraint>& earlier);
