@@ -2,6 +2,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <gtest/gtest.h>
+#include <numeric>
 #include <string>
 #include <vector>
 
@@ -123,13 +124,99 @@ TEST(PlainBoundVerticesAtTheDensest, OfNominalRangesAreMetToTheLastBit) {
     }
 }
 
-TEST(PlainEdges, OfNineComponentsAreMetToTheLastBit) {
+/// Half-spaces that keep the middle of the region and each cut something off.
+void addCuts(RegionMaker& maker, PlainRegion& region, std::size_t count) {
+    const std::size_t q = region.lower.size();
+    std::vector<double> middle(q, 0.0);
+    for (int i = 0; i < 50; ++i) {
+        const std::vector<double> x = maker.inside(region.lower, region.upper);
+        for (std::size_t j = 0; j < q; ++j)
+            middle[j] += x[j] / 50.0;
+    }
+    for (std::size_t c = 0; c < count; ++c) {
+        const std::vector<double> x = maker.inside(region.lower, region.upper);
+        std::vector<double> coefficients(q);
+        for (std::size_t j = 0; j < q; ++j)
+            coefficients[j] = x[j] - middle[j];
+        const double bound = std::inner_product(x.begin(), x.end(), coefficients.begin(), 0.0);
+        for (double& coefficient : coefficients)
+            coefficient *= 100.0;
+        region.constraints.push_back({false, 0.0, true, 100.0 * bound, coefficients, 0});
+    }
+}
+
+// Sizes at which a fast search for edges has reason to work differently than on a few vertices.
+TEST(PlainCuts, OfThousandsOfVerticesAreMetToTheLastBit) {
+    RegionMaker maker(9);
+    for (const std::size_t q : {9U, 10U, 11U}) {
+        PlainRegion region;
+        maker.nominalBounds(q, 0.2, region.lower, region.upper);
+        addCuts(maker, region, 2);
+        const EnumeratedRegion expected = plainlyEnumerated(region);
+        EXPECT_EQ(expected.statuses, (std::vector<int>{0, 0})) << "a cut that is none";
+        ASSERT_TRUE(sameEnumeration(enumerated(region), expected)) << describe(region);
+    }
+}
+
+class PlainCutsByManyPlanes : public testing::TestWithParam<std::size_t> {};
+
+TEST_P(PlainCutsByManyPlanes, AreMetToTheLastBit) {
+    const std::size_t q = GetParam();
+    RegionMaker maker(10 + q);
+    PlainRegion region;
+    maker.nominalBounds(q, 0.3, region.lower, region.upper);
+    addCuts(maker, region, 150);
+    const EnumeratedRegion expected = plainlyEnumerated(region);
+    EXPECT_GT(expected.numPlanes, 64) << "no more planes than a word has bits";
+    ASSERT_TRUE(sameEnumeration(enumerated(region), expected)) << describe(region);
+    // Subsets of so many planes are tried by twos and threes at most.
+    const int degree = q == 5 ? 5 : 1;
+    ASSERT_TRUE(sameCentroids(
+        faceCentroids(expected.points, expected.slack, expected.numPlanes, static_cast<int>(q), degree, kNoLimit),
+        plainFaceCentroids(expected.points, expected.slack, expected.numPlanes, static_cast<int>(q), degree,
+                           kNoLimit)));
+}
+
+INSTANTIATE_TEST_SUITE_P(Components, PlainCutsByManyPlanes, testing::Values(5, 6), testing::PrintToStringParamName());
+
+TEST(PlainCuts, ThroughVerticesThatTieAreMetToTheLastBit) {
+    // Equal ranges and equal coefficients: many sums tie, many planes meet in one vertex.
+    PlainRegion region;
+    region.lower.assign(10, 0.05);
+    region.upper.assign(10, 0.15);
+    region.constraints = {{true, 0.3, false, 0.0, {1, 1, 1, 0, 0, 0, 0, 0, 0, 0}, 0},
+                          {false, 0.0, true, 0.55, {0, 0, 1, 1, 1, 1, 1, 0, 0, 0}, 0},
+                          {true, 0.0, false, 0.0, {0, 0, 0, 0, 0, 0, 0, 1, -1, 0}, 0}};
+    ASSERT_TRUE(sameEnumeration(enumerated(region), plainlyEnumerated(region)));
+}
+
+class PlainFaces : public testing::TestWithParam<std::size_t> {};
+
+TEST_P(PlainFaces, OfManyComponentsAreMetToTheLastBit) {
+    const std::size_t q = GetParam();
+    RegionMaker maker(80 + q);
+    for (int i = 0; i < scaled(q <= 8 ? 10 : 2); ++i) {
+        PlainRegion region;
+        maker.typicalBounds(q, region.lower, region.upper);
+        for (std::uint64_t left = maker.below(3); left > 0; --left)
+            region.constraints.push_back(maker.constraint(region.lower, region.upper, 1.0, region.constraints));
+        const EnumeratedRegion all = enumerated(region);
+        const auto degree = static_cast<int>(q);
+        ASSERT_TRUE(sameCentroids(faceCentroids(all.points, all.slack, all.numPlanes, degree, degree, kNoLimit),
+                                  plainFaceCentroids(all.points, all.slack, all.numPlanes, degree, degree, kNoLimit)))
+            << describe(region);
+    }
+}
+
+INSTANTIATE_TEST_SUITE_P(Components, PlainFaces, testing::Values(8, 9, 10), testing::PrintToStringParamName());
+
+TEST(PlainEdges, OfElevenComponentsAreMetToTheLastBit) {
     RegionMaker maker(8);
     PlainRegion region;
-    maker.typicalBounds(9, region.lower, region.upper);
+    maker.typicalBounds(11, region.lower, region.upper);
     const EnumeratedRegion all = enumerated(region);
-    const auto expected = plainFaceCentroids(all.points, all.slack, all.numPlanes, 9, 2, kNoLimit);
-    EXPECT_TRUE(sameCentroids(faceCentroids(all.points, all.slack, all.numPlanes, 9, 2, kNoLimit), expected));
+    EXPECT_TRUE(sameCentroids(faceCentroids(all.points, all.slack, all.numPlanes, 11, 2, kNoLimit),
+                              plainFaceCentroids(all.points, all.slack, all.numPlanes, 11, 2, kNoLimit)));
 }
 
 }  // namespace
