@@ -55,6 +55,7 @@ class VerticesAllocationFailure : public testing::TestWithParam<FailureCase> {};
 
 TEST_P(VerticesAllocationFailure, OfAnyAllocationIsReportedAndLeavesNothing) {
     const VerticesOutcome expected = plainVerticesDesign(GetParam().request);
+    std::size_t reported = 0;
     for (std::size_t n = 1;; ++n) {
         ASSERT_LT(n, 100000U);
         SCOPED_TRACE(n);
@@ -64,9 +65,15 @@ TEST_P(VerticesAllocationFailure, OfAnyAllocationIsReportedAndLeavesNothing) {
         watch.stop();
         if (!watch.counts().failed) {
             EXPECT_TRUE(sameOutcome(record.outcome(code), expected));
-            EXPECT_GT(n, expected.design.runs.size()) << "every run has an array of its own";
+            EXPECT_GT(reported, expected.design.runs.size()) << "every run has an array of its own";
             break;
         }
+        if (code == des_Success) {
+            // Giving back unused capacity is an allocation that a vector can do without.
+            ASSERT_TRUE(sameOutcome(record.outcome(code), expected));
+            continue;
+        }
+        ++reported;
         ASSERT_EQ(code, des_ErrorOutOfMemory);
         EXPECT_EQ(record->runs, nullptr);
         EXPECT_EQ(record->numRuns, 0U);
