@@ -3,19 +3,17 @@
 
 #include <sys/resource.h>
 
-/// Sanitizers reserve terabytes of addresses and answer huge allocations in their own way.
-#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
-#define REISTI_TESTS_CAN_LIMIT_MEMORY 0
-#elif defined(__has_feature)
-#if __has_feature(address_sanitizer) || __has_feature(thread_sanitizer) || __has_feature(memory_sanitizer)
-#define REISTI_TESTS_CAN_LIMIT_MEMORY 0
-#endif
-#endif
-#ifndef REISTI_TESTS_CAN_LIMIT_MEMORY
-#define REISTI_TESTS_CAN_LIMIT_MEMORY 1
-#endif
-
 namespace reisti::test {
+
+/// Sanitizers reserve terabytes of addresses and answer huge allocations in their own way: no limit there.
+#if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
+inline constexpr bool kCanLimitMemory = false;
+#elif defined(__has_feature)
+inline constexpr bool kCanLimitMemory =
+    !(__has_feature(address_sanitizer) || __has_feature(thread_sanitizer) || __has_feature(memory_sanitizer));
+#else
+inline constexpr bool kCanLimitMemory = true;
+#endif
 
 /// Limits the memory of the process while it lives: what a test asks for too much of fails here on any machine, instead
 /// of being promised by a system that overcommits.

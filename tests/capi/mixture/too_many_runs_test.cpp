@@ -1,4 +1,4 @@
-#include <chrono>
+#include <ctime>
 #include <gtest/gtest.h>
 #include <string>
 #include <vector>
@@ -121,9 +121,12 @@ TEST_P(UncountableDesign, LeavesRunsUntouched) {
 INSTANTIATE_TEST_SUITE_P(All, UncountableDesign, testing::ValuesIn(uncountable()),
                          [](const auto& instance) { return instance.param.name; });
 
-#if REISTI_TESTS_CAN_LIMIT_MEMORY
-
-class UnaffordableDesign : public testing::TestWithParam<SizeCase> {};
+class UnaffordableDesign : public testing::TestWithParam<SizeCase> {
+  protected:
+    void SetUp() override {
+        if (!kCanLimitMemory) GTEST_SKIP() << "a sanitizer holds the address space";
+    }
+};
 
 TEST_P(UnaffordableDesign, IsOutOfMemoryAndLeavesNoRuns) {
     const AddressSpaceLimit limit(rlim_t{4} << 30);
@@ -137,15 +140,14 @@ TEST_P(UnaffordableDesign, IsOutOfMemoryAndLeavesNoRuns) {
 TEST_P(UnaffordableDesign, IsRefusedAtOnce) {
     const AddressSpaceLimit limit(rlim_t{4} << 30);
     MixtureRecord record(GetParam().request);
-    const auto start = std::chrono::steady_clock::now();
+    // Processor time: a busy machine must not fail the test.
+    const std::clock_t start = std::clock();
     record.run();
-    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::milliseconds(500));
+    EXPECT_LT(std::clock() - start, CLOCKS_PER_SEC / 2);
 }
 
 INSTANTIATE_TEST_SUITE_P(All, UnaffordableDesign, testing::ValuesIn(unaffordable()),
                          [](const auto& instance) { return instance.param.name; });
-
-#endif
 
 TEST(LargeDesign, ThatFitsIsBuilt) {
     MixtureRecord record(with(centroidRequest(2), [](auto& r) { r.designReplicates = 100000; }));
