@@ -78,6 +78,8 @@ std::vector<SizeCase> uncountable() {
 /// Designs whose runs can be counted, but not kept.
 std::vector<SizeCase> unaffordable() {
     return {
+        // The array of runs alone would fit into the limit; the proportions of the runs would not.
+        {"TwentyFiveComponents", centroidRequest(25)},
         {"ThirtyComponents", centroidRequest(30)},
         {"ThirtyOneComponents", centroidRequest(31)},
         // 2^32 - 1 points: as many as 32 bits count.
