@@ -46,13 +46,16 @@ void append(SumList& list, const SumCount& entry) {
 
 /// The subsets of one more component: those in the list without it, and those in the list with it.
 SumList withComponent(const SumList& list, double range, double rStar, bool dropAbove) {
+    // Ranges are not negative here: a sum above rStar stays above it, and all later ones in the list are above it, too.
+    const auto isKept = [=](const SumCount& subset) {
+        return equalWithinFuzz(rStar, subset.sum + range, kSumScale) != -1;
+    };
+    const auto end = dropAbove ? std::partition_point(list.begin(), list.end(), isKept) : list.end();
     SumList extended;
     extended.reserve(2 * list.size());
     auto without = list.begin();
-    for (const SumCount& subset : list) {
-        const SumCount with{subset.sum + range, subset.size + 1, subset.count};
-        // Ranges are not negative here: what is above rStar stays above it, and what follows in the list is above, too.
-        if (dropAbove && equalWithinFuzz(rStar, with.sum, kSumScale) == -1) break;
+    for (auto it = list.begin(); it != end; ++it) {
+        const SumCount with{it->sum + range, it->size + 1, it->count};
         while (without != list.end() && without->sum <= with.sum)
             append(extended, *without++);
         append(extended, with);
