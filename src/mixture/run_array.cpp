@@ -4,6 +4,7 @@
 #include <cstddef>
 #include <limits>
 #include <new>
+#include <stdexcept>
 
 #include "mixture/run_counts.h"
 
@@ -54,6 +55,7 @@ void releaseRuns(des_MixtureRun* runs, std::uint32_t count) noexcept {
 }
 
 void copyMixture(des_MixtureDesign& design, std::uint32_t from, std::uint32_t to) {
+    if (to >= design.numRuns) throw std::length_error("more runs than counted");
     const des_MixtureRun& source = design.runs[from];
     des_MixtureRun& copy = design.runs[to];
     allocateArrays(design, copy);

@@ -23,6 +23,7 @@ void releaseRuns(des_MixtureRun* runs, std::uint32_t count) noexcept;
 
 /// Writes run `to`, which has no arrays yet, as a copy of the mixture of run `from`, in its own place in the order.
 /// Amount and process levels belong to the place and are not copied.
+/// @throw std::length_error when the design has no run `to`
 void copyMixture(des_MixtureDesign& design, std::uint32_t from, std::uint32_t to);
 
 }  // namespace reisti

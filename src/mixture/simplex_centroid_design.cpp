@@ -2,7 +2,9 @@
 
 #include <algorithm>
 #include <cstddef>
+#include <functional>
 #include <numeric>
+#include <stdexcept>
 
 #include "mixture/boundary_counts.h"
 #include "mixture/component_bounds.h"
@@ -59,6 +61,7 @@ void SimplexCentroidDesign::RunPipeline(int& error) {
     MixtureAmountExperiment();
     SetProcessVariables(error);
     if (error != 0) return;
+    RequireAllRunsWritten();
     RescaleMixtureCatalogDesigns();
     RandomizeDesign();
     ComputeBounds();
@@ -182,6 +185,10 @@ void SimplexCentroidDesign::SetProcessVariables(int& error) {
         allocateArrays(*design_, design_->runs[i]);
         std::fill_n(design_->runs[i].proportions, design_->numComponents, 0.0);
     }
+}
+
+void SimplexCentroidDesign::RequireAllRunsWritten() const {
+    if (runCounter_ != design_->numRuns) throw std::length_error("fewer runs than counted");
 }
 
 void SimplexCentroidDesign::RescaleMixtureCatalogDesigns() {

@@ -89,6 +89,7 @@ class SimplexCentroidDesign {
 
   private:
     void RunPipeline(int& error);
+    void RequireAllRunsWritten() const;
     void AppendSubsetCentroids(std::uint32_t size, std::int32_t pointType);
 
     bool runsAllocated_ = false;
@@ -101,8 +102,8 @@ inline bool SimplexCentroidDesign::IsTypeRun(std::int32_t pointType) const {
 }
 
 inline des_MixtureRun& SimplexCentroidDesign::AppendRun(std::int32_t pointType) {
-    // The runs were counted by formula and are written by enumeration; should the two ever differ, nothing may be
-    // written behind the array.
+    // The runs were counted by formula and are written by enumeration. Should the two ever differ, nothing may be
+    // written behind the array, nor may a run stay unwritten.
     if (runCounter_ == design_->numRuns) throw std::length_error("more runs than counted");
     des_MixtureRun& run = design_->runs[runCounter_++];
     run.runOrder = runCounter_;
