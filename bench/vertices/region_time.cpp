@@ -1,4 +1,4 @@
-// usage: region_time REGION DEGREE
+// usage: region_time REGION DEGREE [once]
 //
 // Enumerates a region of regions/ and prints vertices, centroids, the most memory that it
 // held at once as a multiple of its results, and the milliseconds of the enumeration (the best of some).
@@ -38,8 +38,8 @@ void operator delete(void* block, std::size_t) noexcept {
 }
 
 int main(int argc, char** argv) try {
-    if (argc != 3) {
-        std::fprintf(stderr, "usage: region_time REGION DEGREE\n");
+    if (argc < 3) {
+        std::fprintf(stderr, "usage: region_time REGION DEGREE [once]\n");
         return 2;
     }
     const bench::Region region(std::string(REISTI_REGIONS_DIR) + "/" + argv[1] + ".txt");
@@ -49,7 +49,9 @@ int main(int argc, char** argv) try {
     using Milliseconds = std::chrono::duration<double, std::milli>;
     double best = 1e300;
     double spent = 0.0;
-    for (int repeat = 0; repeat < 3 || (spent < 500.0 && repeat < 100); ++repeat) {
+    const int fewest = argc > 3 ? 1 : 3;
+    const int most = argc > 3 ? 1 : 100;
+    for (int repeat = 0; repeat < fewest || (spent < 500.0 && repeat < most); ++repeat) {
         const std::size_t before = heldBytes;
         mostBytes = heldBytes;
         bench::Enumeration enumeration;

@@ -95,10 +95,12 @@ std::vector<double> VertexCodes::rows() const {
     const std::size_t groups = (q_ + kGroup - 1) / kGroup;
     constexpr std::size_t kPatterns = std::size_t{1} << kGroup;
     std::vector<double> patterns(groups * kPatterns * kGroup, 0.0);
-    for (std::size_t j = 0; j < q_; ++j)
-        for (std::size_t bits = 0; bits < kPatterns; ++bits)
+    for (std::size_t j = 0; j < q_; ++j) {
+        for (std::size_t bits = 0; bits < kPatterns; ++bits) {
             patterns[(j / kGroup * kPatterns + bits) * kGroup + j % kGroup] =
                 (bits >> (j % kGroup) & 1U) != 0 ? upper_[j] : lower_[j];
+        }
+    }
 
     std::vector<double> rows;
     rows.reserve(count() * q_);

@@ -40,9 +40,10 @@ void hashPlaneSets(const std::vector<std::uint64_t>& keys, std::size_t size, std
         for (const std::uint64_t key : keys)
             hashes.push_back(all ^ key);
     } else if (keys.size() == size + 2) {
-        for (std::size_t i = 0; i < keys.size(); ++i)
+        for (std::size_t i = 0; i < keys.size(); ++i) {
             for (std::size_t j = i + 1; j < keys.size(); ++j)
                 hashes.push_back(all ^ keys[i] ^ keys[j]);
+        }
     }
 }
 
@@ -116,9 +117,10 @@ class CutRegion::Neighbours {
     void collectKeys(std::size_t vertex) {
         keys_.clear();
         const std::uint64_t* const mask = region_.mask(vertex);
-        for (std::size_t w = 0; w < region_.words_; ++w)
+        for (std::size_t w = 0; w < region_.words_; ++w) {
             for (std::uint64_t bits = mask[w]; bits != 0; bits &= bits - 1)
                 keys_.push_back(mixBits(w * kWordBits + static_cast<std::size_t>(std::countr_zero(bits))));
+        }
     }
 
     const CutRegion& region_;
@@ -137,16 +139,21 @@ CutRegion::CutRegion(std::size_t q, std::vector<double> points, std::vector<doub
       points_(std::move(points)),
       planes_(std::move(planes)),
       masks_(numVertices() * words_, 0) {
-    for (std::size_t v = 0; v < numVertices(); ++v)
+    for (std::size_t v = 0; v < numVertices(); ++v) {
         for (std::size_t p = 0; p < numPlanes(); ++p)
-            if (isOn(slack[v * numPlanes() + p]))
-                masks_[v * words_ + p / kWordBits] |= std::uint64_t{1} << (p % kWordBits);
+            if (isOn(slack[v * numPlanes() + p])) setBit(v, p);
+    }
 }
 
 std::vector<double> CutRegion::takePoints() && {
     std::vector<std::uint64_t>().swap(masks_);
-    points_.shrink_to_fit();
+    // Not shrink_to_fit(): it would hide that there was no memory.
+    if (points_.capacity() > points_.size()) std::vector<double>(points_).swap(points_);
     return std::move(points_);
+}
+
+void CutRegion::setBit(std::size_t vertex, std::size_t plane) {
+    masks_[vertex * words_ + plane / kWordBits] |= std::uint64_t{1} << (plane % kWordBits);
 }
 
 bool CutRegion::areAdjacent(std::size_t a, std::size_t b) const {
@@ -256,7 +263,7 @@ void CutRegion::appendMask(const double* point) {
     const std::size_t first = masks_.size();
     masks_.resize(first + words_, 0);
     for (std::size_t p = 0; p < values.size(); ++p)
-        if (isOn(values[p])) masks_[first + p / kWordBits] |= std::uint64_t{1} << (p % kWordBits);
+        if (isOn(values[p])) setBit(first / words_, p);
 }
 
 /// Gives the masks another word when the planes have outgrown them.
@@ -271,7 +278,7 @@ void CutRegion::widenMasks() {
 
 void CutRegion::markPlane(std::size_t plane, const std::vector<double>& values) {
     for (std::size_t v = 0; v < values.size(); ++v)
-        if (isOn(values[v])) masks_[v * words_ + plane / kWordBits] |= std::uint64_t{1} << (plane % kWordBits);
+        if (isOn(values[v])) setBit(v, plane);
 }
 
 void CutRegion::keepOnly(const std::vector<double>& values) {

@@ -58,6 +58,7 @@ class CutRegion {
 
     const double* row(std::size_t vertex) const { return &points_[vertex * q_]; }
     const std::uint64_t* mask(std::size_t vertex) const { return &masks_[vertex * words_]; }
+    void setBit(std::size_t vertex, std::size_t plane);
     bool areAdjacent(std::size_t a, std::size_t b) const;
     void addCutVertices(const std::vector<double>& plane, std::vector<double>& values);
     void appendMask(const double* point);

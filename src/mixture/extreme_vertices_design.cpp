@@ -76,9 +76,10 @@ void ExtremeVerticesDesign::GenerateBaseDesign() {
     axialCount_ = numVertices_;
     CalculateNumPointsPerType();
     AugmentDesign();
-    for (std::size_t i = 0; i < numPoints; ++i)
+    for (std::size_t i = 0; i < numPoints; ++i) {
         if (IsTypeRun(basePointTypes_[i]))
             std::copy_n(points_.data() + i * q, q, AppendRun(basePointTypes_[i]).proportions);
+    }
 }
 
 /// With a degree that is a multiple of q the faces include the whole region, whose centroid the mean is.
@@ -89,9 +90,10 @@ bool ExtremeVerticesDesign::IsMeanOfVerticesAppended() const {
 std::vector<double> ExtremeVerticesDesign::MeanOfVertices() const {
     const std::size_t q = design_->numComponents;
     std::vector<double> mean(q, 0.0);
-    for (std::size_t v = 0; v < numVertices_; ++v)
+    for (std::size_t v = 0; v < numVertices_; ++v) {
         for (std::size_t j = 0; j < q; ++j)
             mean[j] += points_.data()[v * q + j];
+    }
     for (double& component : mean)
         component /= numVertices_;
     return mean;

@@ -36,9 +36,10 @@ class FaceWalk {
     template <typename Visit>
     bool walk(std::size_t setSize, std::size_t minVertices, Visit&& visit) {
         begin(setSize, minVertices, false);
-        while (Level* const last = nextLastLevel())
+        while (Level* const last = nextLastLevel()) {
             for (const Child& child : last->children)
                 if (!wasCovered(*last, child, 0) && !visit(membersOf(*last, child))) return false;
+        }
         return true;
     }
 

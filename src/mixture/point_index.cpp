@@ -25,9 +25,10 @@ PointIndex::PointIndex(std::size_t q) : directions_(kDirections * q) {
 PointIndex::Place PointIndex::place(const double* point) const {
     const std::size_t q = directions_.size() / kDirections;
     Place place{};
-    for (std::size_t j = 0; j < q; ++j)
+    for (std::size_t j = 0; j < q; ++j) {
         for (std::size_t d = 0; d < kDirections; ++d)
             place[d] += directions_[d * q + j] * point[j];
+    }
     return place;
 }
 
