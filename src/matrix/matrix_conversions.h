@@ -29,10 +29,20 @@ template <typename T>
 UTmatrix<T> SmatrixToUTmatrix(const Smatrix<T>& s) {
     const int order = s.rowCount();
     UTmatrix<T> result(order, T());
-    T* element = result.data();
-    for (int i = 0; i < order; ++i) {
-        for (int j = i; j < order; ++j) {
-            *element++ = s(j, i);
+    // Rows of s in bands: they become columns, and a band of columns shares its cache lines.
+    constexpr std::ptrdiff_t kBand = 8;
+    const T* const mirrored = s.data();
+    for (std::ptrdiff_t band = 0; band < order; band += kBand) {
+        const std::ptrdiff_t bandEnd = std::min<std::ptrdiff_t>(band + kBand, order);
+        T* row = result.data();
+        for (std::ptrdiff_t i = 0; i < bandEnd; ++i) {
+            const std::ptrdiff_t first = std::max(i, band);
+            std::ptrdiff_t place = first * (first + 1) / 2 + i;
+            for (std::ptrdiff_t j = first; j < bandEnd; ++j) {
+                row[j - i] = mirrored[place];
+                place += j + 1;
+            }
+            row += order - i;
         }
     }
     return result;
