@@ -6,6 +6,7 @@
 #include <utility>
 #include <vector>
 
+#include "matrix/kernels/level_table.h"
 #include "util/math_routines.h"
 
 namespace reisti::kernels {
@@ -21,174 +22,200 @@ constexpr double kNegligible = 0x1p-53;
 // Relative distance below which two values count as equal.
 constexpr double kValueFuzz = 1e-12;
 
-// The matrix as it is reduced: diagonal, element i of `below` left of diagonal i + 1, and the transposed orthogonal
-// matrix of the similarity, one row for each vector.
-struct Tridiagonal {
-    std::vector<double> diagonal;
-    std::vector<double> below;
-    std::vector<double> rows;
-};
+// Sums of squares between these bounds neither overflowed nor lost digits to the subnormal range.
+constexpr double kLeastSafeSquare = 0x1p-900;
+constexpr double kGreatestSafeSquare = 0x1p900;
 
-// Householder reduction from the last row up, so that the part still to be reduced is a leading block of short rows.
-// Afterwards row i of `a` left of the diagonal holds the reflection vector of that row, and norms[i] half its squared
-// length, 0 where the row needed no reflection.
-void reduce(std::vector<double>& a, std::size_t n, Tridiagonal& t, std::vector<double>& norms) {
-    std::vector<double> p(n);
-    for (std::size_t i = n; i-- > 1;) {
-        double* const v = a.data() + i * n;
-        const double beyond = std::inner_product(v, v + i - 1, v, 0.0);
-        const double last = v[i - 1];
-        if (beyond == 0.0) {
-            t.below[i - 1] = last;
-            continue;
-        }
-        const double squares = beyond + last * last;
-        const double target = -mTransferSign(std::sqrt(squares), last);
-        const double half = squares - last * target;
-        t.below[i - 1] = target;
-        norms[i] = half;
-        v[i - 1] = last - target;
+// Matrices whose greatest element lies outside these bounds are scaled, so that products of four elements stay finite.
+constexpr double kLeastMagnitude = 0x1p-200;
+constexpr double kGreatestMagnitude = 0x1p200;
 
-        std::fill_n(p.begin(), i, 0.0);
-        for (std::size_t r = 0; r < i; ++r) {
-            const double* const row = a.data() + r * n;
-            for (std::size_t k = 0; k < r; ++k)
-                p[k] += row[k] * v[r];
-            p[r] += std::inner_product(row, row + r + 1, v, 0.0);
-        }
-        double common = 0.0;
-        for (std::size_t k = 0; k < i; ++k) {
-            p[k] /= half;
-            common += p[k] * v[k];
-        }
-        common /= 2.0 * half;
-        for (std::size_t k = 0; k < i; ++k)
-            p[k] -= common * v[k];
-        for (std::size_t r = 0; r < i; ++r) {
-            double* const row = a.data() + r * n;
-            for (std::size_t k = 0; k <= r; ++k)
-                row[k] -= v[r] * p[k] + p[r] * v[k];
-        }
-    }
-    for (std::size_t i = 0; i < n; ++i)
-        t.diagonal[i] = a[i * n + i];
-}
+// Powers of two beyond this have no finite reciprocal.
+constexpr int kGreatestExponent = 1000;
 
-// Multiplies the reflections, first to last, into t.rows: with each the leading block grows by one.
-void accumulate(const std::vector<double>& a, std::size_t n, const std::vector<double>& norms, Tridiagonal& t) {
-    for (std::size_t i = 0; i < n; ++i) {
-        t.rows[i * n + i] = 1.0;
-        if (norms[i] == 0.0) continue;
-        const double* const v = a.data() + i * n;
-        for (std::size_t r = 0; r < i; ++r) {
-            double* const row = t.rows.data() + r * n;
-            const double factor = std::inner_product(v, v + i, row, 0.0) / norms[i];
-            for (std::size_t k = 0; k < i; ++k)
-                row[k] -= factor * v[k];
-        }
-    }
+// Rotations are recorded and applied strip by strip: with enough of them at a time a strip is loaded once for many, and
+// few enough that their record stays in the cache beside it.
+constexpr std::size_t kRecordedRotations = 4096;
+
+double lengthOf(double x, double y) {
+    const double squares = x * x + y * y;
+    const bool isSafe = squares > kLeastSafeSquare && squares < kGreatestSafeSquare;
+    return isSafe ? std::sqrt(squares) : std::hypot(x, y);
 }
 
 bool isZero(double x) {
     return mCompareWithFuzz(x, 0.0, 0.0, kValueFuzz) == 0;
 }
 
-// One QL sweep with implicit shift over diagonal elements l to m.
-void sweep(Tridiagonal& t, std::size_t n, std::size_t l, std::size_t m) {
-    double* const d = t.diagonal.data();
-    double* const e = t.below.data();
-    double g = (d[l + 1] - d[l]) / (2.0 * e[l]);
-    g = d[m] - d[l] + e[l] / (g + mTransferSign(std::hypot(g, 1.0), g));
-    double s = 1.0;
-    double c = 1.0;
-    double p = 0.0;
-    for (std::size_t i = m; i-- > l;) {
-        const double f = s * e[i];
-        const double b = c * e[i];
-        double r = std::hypot(f, g);
-        e[i + 1] = r;
-        if (isZero(r)) {
-            // The matrix has split at i + 1; the next search finds it.
-            d[i + 1] -= p;
-            e[m] = 0.0;
-            return;
-        }
-        s = f / r;
-        c = g / r;
-        g = d[i + 1] - p;
-        r = (d[i] - g) * s + 2.0 * c * b;
-        p = s * r;
-        d[i + 1] = g + p;
-        g = c * r - b;
-        double* const upper = t.rows.data() + i * n;
-        double* const lower = upper + n;
-        for (std::size_t k = 0; k < n; ++k) {
-            const double high = upper[k];
-            const double low = lower[k];
-            lower[k] = s * high + c * low;
-            upper[k] = c * high - s * low;
-        }
+// The power of two by which to multiply the matrix before, and its values to divide after, the work.
+double scaleFor(const double* a, std::size_t n) {
+    double greatest = 0.0;
+    for (std::size_t i = 0; i < n; ++i) {
+        for (std::size_t j = 0; j <= i; ++j)
+            greatest = std::max(greatest, std::fabs(a[i * n + j]));
     }
-    d[l] -= p;
-    e[l] = g;
-    e[m] = 0.0;
+    const bool needsScaling = greatest > 0.0 && (greatest < kLeastMagnitude || greatest > kGreatestMagnitude);
+    if (!needsScaling || !std::isfinite(greatest)) return 1.0;
+    return std::ldexp(1.0, -std::clamp(std::ilogb(greatest), -kGreatestExponent, kGreatestExponent));
 }
 
-std::size_t findSplit(const Tridiagonal& t, std::size_t n, std::size_t l) {
-    std::size_t m = l;
-    while (m + 1 < n) {
-        const double neighbours = std::fabs(t.diagonal[m]) + std::fabs(t.diagonal[m + 1]);
-        if (mCompareWithFuzz(std::fabs(t.below[m]), neighbours * kNegligible, 0.0, kValueFuzz) <= 0) break;
+// Eigenvalues by QL iteration with implicit shifts (Bowdler, Martin, Reinsch and Wilkinson, 1968), and the transposed
+// eigenvectors in strips of kStrip columns.
+class Solver {
+  public:
+    Solver(const LevelTable& table, std::size_t n)
+        : table_(table), n_(n), diagonal_(n), below_(n), strips_((n + kStrip - 1) / kStrip * kStrip * n), order_(n) {
+        std::iota(order_.begin(), order_.end(), std::size_t{0});
+    }
+
+    void reduce(const double* a, double scale);
+    // False, with the index of the eigenvalue, when one does not converge.
+    bool iterate(std::size_t& failed);
+    void sort();
+    void write(double scale, double* values, double* vectors) const;
+
+  private:
+    double* strip(std::size_t column) { return strips_.data() + column / kStrip * kStrip * n_; }
+    void toStrips(const double* rows, std::size_t stride);
+    std::size_t findSplit(std::size_t first) const;
+    void sweep(std::size_t first, std::size_t last);
+    void applyRotations();
+
+    const LevelTable& table_;
+    std::size_t n_;
+    std::vector<double> diagonal_;
+    std::vector<double> below_;  // element i is left of diagonal element i + 1
+    std::vector<double> strips_;
+    std::vector<std::size_t> order_;  // row of the transposed eigenvectors that belongs to each value
+    std::vector<RotationSweep> sweeps_;
+    std::vector<Rotation> rotations_;
+};
+
+void Solver::reduce(const double* a, double scale) {
+    const std::size_t stride = (n_ + 15) / 8 * 8;
+    std::vector<double> reduced(n_ * stride);
+    for (std::size_t i = 0; i < n_; ++i) {
+        for (std::size_t j = 0; j <= i; ++j)
+            reduced[i * stride + j] = reduced[j * stride + i] = a[i * n_ + j] * scale;
+    }
+    std::vector<double> factors(n_);
+    table_.reduceToTridiagonal(reduced.data(), n_, stride, diagonal_.data(), below_.data(), factors.data());
+    std::vector<double> product(n_ * stride);
+    table_.multiplyReflections(reduced.data(), n_, stride, factors.data(), product.data());
+    toStrips(product.data(), stride);
+}
+
+void Solver::toStrips(const double* rows, std::size_t stride) {
+    for (std::size_t column = 0; column < n_; column += kStrip) {
+        const std::size_t width = std::min(kStrip, n_ - column);
+        for (std::size_t i = 0; i < n_; ++i)
+            std::copy_n(rows + i * stride + column, width, strip(column) + i * kStrip);
+    }
+}
+
+std::size_t Solver::findSplit(std::size_t first) const {
+    std::size_t m = first;
+    while (m + 1 < n_) {
+        const double neighbours = std::fabs(diagonal_[m]) + std::fabs(diagonal_[m + 1]);
+        if (mCompareWithFuzz(std::fabs(below_[m]), neighbours * kNegligible, 0.0, kValueFuzz) <= 0) break;
         ++m;
     }
     return m;
 }
 
-// 0, or the index of the eigenvalue that did not converge.
-bool diagonalize(Tridiagonal& t, std::size_t n, std::size_t& failed) {
-    for (std::size_t l = 0; l < n; ++l) {
+bool Solver::iterate(std::size_t& failed) {
+    bool succeeds = true;
+    for (std::size_t l = 0; succeeds && l < n_; ++l) {
         for (int iteration = 0;; ++iteration) {
-            const std::size_t m = findSplit(t, n, l);
+            const std::size_t m = findSplit(l);
             if (m == l) break;
             if (iteration == kMaxIterations) {
                 failed = l;
-                return false;
+                succeeds = false;
+                break;
             }
-            sweep(t, n, l, m);
+            sweep(l, m);
+            if (rotations_.size() >= kRecordedRotations) applyRotations();
         }
     }
-    return true;
+    applyRotations();
+    return succeeds;
 }
 
-void sort(Tridiagonal& t, std::size_t n) {
-    for (std::size_t i = 0; i < n; ++i) {
+// One QL step on the diagonal elements first to last.
+void Solver::sweep(std::size_t first, std::size_t last) {
+    double* const d = diagonal_.data();
+    double* const e = below_.data();
+    double g = (d[first + 1] - d[first]) / (2.0 * e[first]);
+    g = d[last] - d[first] + e[first] / (g + mTransferSign(lengthOf(g, 1.0), g));
+    double s = 1.0;
+    double c = 1.0;
+    double p = 0.0;
+    std::size_t i = last;
+    for (; i > first; --i) {
+        const double f = s * e[i - 1];
+        const double b = c * e[i - 1];
+        double r = lengthOf(f, g);
+        e[i] = r;
+        // The matrix has split here; the next search finds it.
+        if (isZero(r)) break;
+        s = f / r;
+        c = g / r;
+        g = d[i] - p;
+        r = (d[i - 1] - g) * s + 2.0 * c * b;
+        p = s * r;
+        d[i] = g + p;
+        g = c * r - b;
+        rotations_.push_back({s, c});
+    }
+    sweeps_.push_back({last, last - i});
+    d[i] -= p;
+    if (i == first) e[first] = g;
+    e[last] = 0.0;
+}
+
+void Solver::applyRotations() {
+    for (std::size_t column = 0; column < n_; column += kStrip)
+        table_.rotateStrip(strip(column), sweeps_.data(), sweeps_.size(), rotations_.data());
+    sweeps_.clear();
+    rotations_.clear();
+}
+
+void Solver::sort() {
+    for (std::size_t i = 0; i < n_; ++i) {
         std::size_t least = i;
-        for (std::size_t j = i + 1; j < n; ++j) {
-            if (mCompareWithFuzz(t.diagonal[j], t.diagonal[least], 0.0, kValueFuzz) < 0) least = j;
+        for (std::size_t j = i + 1; j < n_; ++j) {
+            if (mCompareWithFuzz(diagonal_[j], diagonal_[least], 0.0, kValueFuzz) < 0) least = j;
         }
-        if (least == i) continue;
-        std::swap(t.diagonal[i], t.diagonal[least]);
-        double* const row = t.rows.data() + i * n;
-        std::swap_ranges(row, row + n, t.rows.data() + least * n);
+        std::swap(diagonal_[i], diagonal_[least]);
+        std::swap(order_[i], order_[least]);
+    }
+}
+
+void Solver::write(double scale, double* values, double* vectors) const {
+    for (std::size_t k = 0; k < n_; ++k)
+        values[k] = diagonal_[k] / scale;
+    for (std::size_t i = 0; i < n_; ++i) {
+        const double* const column = strips_.data() + i / kStrip * kStrip * n_ + i % kStrip;
+        for (std::size_t k = 0; k < n_; ++k)
+            vectors[i * n_ + k] = column[order_[k] * kStrip];
     }
 }
 
 }  // namespace
 
-std::size_t eigenSystem(const double* a, std::size_t n, double* values, double* vectors) {
-    Tridiagonal t{std::vector<double>(n), std::vector<double>(n), std::vector<double>(n * n)};
-    std::vector<double> reduced(a, a + n * n);
-    std::vector<double> norms(n);
-    reduce(reduced, n, t, norms);
-    accumulate(reduced, n, norms, t);
+std::size_t eigenSystem(Level level, const double* a, std::size_t n, double* values, double* vectors) {
+    const double scale = scaleFor(a, n);
+    Solver solver(tableOf(level), n);
+    solver.reduce(a, scale);
     std::size_t failed = 0;
-    if (diagonalize(t, n, failed)) sort(t, n);
-    std::copy(t.diagonal.begin(), t.diagonal.end(), values);
-    for (std::size_t i = 0; i < n; ++i) {
-        for (std::size_t k = 0; k < n; ++k)
-            vectors[i * n + k] = t.rows[k * n + i];
-    }
+    if (solver.iterate(failed)) solver.sort();
+    solver.write(scale, values, vectors);
     return failed;
+}
+
+std::size_t eigenSystem(const double* a, std::size_t n, double* values, double* vectors) {
+    return eigenSystem(bestLevel(), a, n, values, vectors);
 }
 
 }  // namespace reisti::kernels

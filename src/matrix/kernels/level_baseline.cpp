@@ -6,6 +6,7 @@
 
 #include "matrix/kernels/level_table.h"
 #include "matrix/kernels/workspace.h"
+#include "util/math_routines.h"
 
 #define REISTI_TARGET
 

@@ -9,6 +9,20 @@
 
 namespace reisti::kernels {
 
+struct Rotation {
+    double sine;
+    double cosine;
+};
+
+// A chain of rotations: the first turns rows `bottom` and `bottom` - 1, each further one the two rows above.
+struct RotationSweep {
+    std::size_t bottom;
+    std::size_t rotations;
+};
+
+// Columns that are rotated together, and stored together while rotations go on.
+inline constexpr std::size_t kStrip = 16;
+
 struct LevelTable {
     using Product = void (*)(const double* a, const double* b, double* c, std::size_t m, std::size_t k, std::size_t n);
     using AccumulateProduct = void (*)(const double* a, std::size_t aStride, const double* b, std::size_t bStride,
@@ -35,6 +49,13 @@ struct LevelTable {
     void (*invertLu)(const double* lu, const int* index, std::size_t n, double* inverse);
     std::ptrdiff_t (*factorCholesky)(double* a, std::size_t n, std::size_t start, double& pivot);
     void (*invertCholesky)(const double* u, std::size_t n, double* inverse);
+
+    // The parts of eigenSystem; documented at their definitions in eigen.inc.
+    void (*reduceToTridiagonal)(double* a, std::size_t n, std::size_t stride, double* diagonal, double* below,
+                                double* factors);
+    void (*multiplyReflections)(const double* vectors, std::size_t n, std::size_t stride, const double* factors,
+                                double* product);
+    void (*rotateStrip)(double* strip, const RotationSweep* sweeps, std::size_t count, const Rotation* rotations);
 };
 
 extern const LevelTable kBaselineTable;
