@@ -11,6 +11,7 @@ using qan::matrix_library::determinant;
 using qan::matrix_library::determinantWithThrow;
 using qan::matrix_library::inverse;
 using qan::matrix_library::inverseWithThrow;
+using qan::matrix_library::LUBackSubTemplate;
 using qan::matrix_library::LUDecomposition;
 
 constexpr double kInfinity = std::numeric_limits<double>::infinity();
@@ -140,6 +141,52 @@ TEST(LuSolve, BadOutputPointersAreAssertions) {
                     IsAssertion("&B != X"));
         EXPECT_EQ(both(0, 0), 3.0);
     }
+}
+
+TEST(LuSolve, RefusesARightHandSideOfAnotherLength) {
+    const LUDecomposition lu(dense(plainIdentity(2)));
+    for (const int length : {0, 1, 3}) {
+        Vec x;
+        Dense many;
+        EXPECT_THROW(static_cast<void>(lu.Solve(Vec(static_cast<std::size_t>(length), 1.0), &x)), MatrixException);
+        EXPECT_THROW(static_cast<void>(lu.Solve(Dense(length, 2, 1.0), &many)), MatrixException);
+    }
+}
+
+TEST(LuBackSubstitution, FollowsTheRecordedExchanges) {
+    // The factors of [[1, 8], [4, 4]], whose rows were exchanged.
+    Vec x{17, 12};
+    LUBackSubTemplate(Dense(Vec{4, 4, 0.25, 7}, 2), {1, 1}, &x);
+    EXPECT_EQ(x, (Vec{1, 2}));
+}
+
+TEST(LuBackSubstitution, LeadingZerosMeetNoMultiplier) {
+    // The multiplier below the first row is infinite: times the leading zero it would spoil the solution.
+    Vec x{0, 5};
+    LUBackSubTemplate(Dense(Vec{1, 0, kInfinity, 1}, 2), {0, 1}, &x);
+    EXPECT_EQ(x, (Vec{0, 5}));
+    // Behind the first element that is not zero, every multiplier counts.
+    x = {1, 5};
+    LUBackSubTemplate(Dense(Vec{1, 0, kInfinity, 1}, 2), {0, 1}, &x);
+    EXPECT_EQ(x[1], -kInfinity);
+}
+
+TEST(LuBackSubstitution, ZeroOnTheDiagonalIsAnAssertion) {
+    Vec x{1, 1};
+    EXPECT_THAT(messageOf<AllegeException>([&] {
+                    LUBackSubTemplate(Dense(Vec{1, 2, 0, 0}, 2), {0, 1}, &x);
+                }),
+                IsAssertion("lhs( i, i )", "src/matrix/matrix_ludecomposition"));
+    x = {1, 1};
+    EXPECT_THAT(messageOf<AllegeException>([&] {
+                    LUBackSubTemplate(Dense(Vec{0, 2, 0, 1}, 2), {0, 1}, &x);
+                }),
+                IsAssertion("lhs( i, i )", "src/matrix/matrix_ludecomposition"));
+}
+
+TEST(LuBackSubstitution, NullOutputIsAnAssertion) {
+    EXPECT_THAT(messageOf<AllegeException>([] { LUBackSubTemplate(Dense(1, 1, 1.0), {0}, nullptr); }),
+                IsAssertion("x", "src/matrix/matrix_ludecomposition"));
 }
 
 /// |L| |U|: what the rounding errors of a solution grow with.

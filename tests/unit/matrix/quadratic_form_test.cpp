@@ -81,6 +81,12 @@ TEST(WeightedResidualForm, SolvesWithTheTransformedMatrix) {
     EXPECT_DOUBLE_EQ(mQuadraticForm(symmetric(plainIdentity(2)), b, Vec{2, 2}, Vec{2, 3}), 2.0);
 }
 
+TEST(WeightedResidualForm, IsAMemberOfBothKinds) {
+    const Dense b(Vec{2, 0, 0, 3}, 2);
+    EXPECT_DOUBLE_EQ(dense(plainIdentity(2)).mQuadraticForm(b, Vec{2, 2}, Vec{2, 3}), 2.0);
+    EXPECT_DOUBLE_EQ(symmetric(plainIdentity(2)).mQuadraticForm(b, Vec{2, 2}, Vec{2, 3}), 2.0);
+}
+
 TEST(WeightedResidualForm, WorksWithAWideTransformation) {
     // b a b^T = 1 * 2 * 1 + 1 * 3 * 1 = 5 and b x - y = 1 + 2 - 13 = -10: 100 / 5.
     const Dense b(1, 2, 1.0);
