@@ -1,6 +1,7 @@
 #ifndef REISTI_TESTS_GOLDEN_DSD_GOLDEN_TEXT_H
 #define REISTI_TESTS_GOLDEN_DSD_GOLDEN_TEXT_H
 
+#include <filesystem>
 #include <fstream>
 #include <sstream>
 #include <stdexcept>
@@ -11,9 +12,8 @@ namespace reisti::test {
 
 /// The words of each line of a golden file; comments (#) and empty lines are left out.
 inline std::vector<std::vector<std::string>> goldenLines(const std::string& name) {
-    const std::string path = std::string(REISTI_GOLDEN_DIR) + "/dsd/" + name;
-    std::ifstream file(path);
-    if (!file) throw std::runtime_error("no golden file " + path);
+    std::ifstream file(std::filesystem::path(REISTI_GOLDEN_DIR) / "dsd" / name);
+    if (!file) throw std::runtime_error("a golden file is missing: " + name);
     std::vector<std::vector<std::string>> lines;
     for (std::string line; std::getline(file, line);) {
         if (line.empty() || line.front() == '#') continue;

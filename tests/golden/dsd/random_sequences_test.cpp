@@ -38,7 +38,8 @@ std::string sequenceText(const std::string& seedText) {
 std::string joined(const std::vector<std::string>& words) {
     std::string line;
     for (const std::string& word : words) {
-        line += line.empty() ? word : ' ' + word;
+        if (!line.empty()) line += ' ';
+        line += word;
     }
     return line;
 }
@@ -70,7 +71,8 @@ std::string designText(const Request& request, double seed) {
 TEST(RecordedDesign, RandomizedDesignIsUnchanged) {
     std::string recorded;
     for (const auto& words : goldenLines("randomized_design.txt")) {
-        recorded += joined(words) + '\n';
+        recorded += joined(words);
+        recorded += '\n';
     }
     const std::string now = designText(Request{6, {1, 3}, 4, 2}, 2024.5);
     EXPECT_TRUE(recorded == now) << "the design is now\n" << now;

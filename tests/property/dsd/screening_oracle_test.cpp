@@ -27,6 +27,9 @@ using reisti::test::plain::PlainRun;
 using reisti::test::plain::Request;
 using List = std::vector<std::uint32_t>;
 
+// The plain formulation is slow under a sanitizer: there only every seventh size of a long series is tried.
+constexpr std::uint32_t kStep = scaled(7) == 7 ? 1 : 7;
+
 std::string describe(const Request& request) {
     std::ostringstream text;
     text << request.numFactors << " factors, " << request.replicates << " replicates, " << request.numBlocks
@@ -100,7 +103,7 @@ TEST_P(EveryNumberOfFactors, EachSingleCategoricalFactor) {
 }
 
 TEST_P(EveryNumberOfFactors, EachSingleContinuousFactor) {
-    for (std::uint32_t column = 0; column < n(); ++column) {
+    for (std::uint32_t column = 0; column < n(); column += kStep) {
         List list = firstFactors(n());
         list.erase(list.begin() + column);
         expectPlainDesign({n(), list});
@@ -110,7 +113,7 @@ TEST_P(EveryNumberOfFactors, EachSingleContinuousFactor) {
 }
 
 TEST_P(EveryNumberOfFactors, FirstFactorsCategoricalAscendingAndDescending) {
-    for (std::uint32_t k = 1; k <= n(); ++k) {
+    for (std::uint32_t k = 1; k <= n(); k += kStep) {
         List list = firstFactors(k);
         expectPlainDesign({n(), list});
         std::reverse(list.begin(), list.end());
@@ -120,7 +123,7 @@ TEST_P(EveryNumberOfFactors, FirstFactorsCategoricalAscendingAndDescending) {
 
 TEST_P(EveryNumberOfFactors, CategoricalSubsetsAscendingAndShuffled) {
     std::mt19937 engine(n());
-    for (std::uint32_t k = 1; k <= n(); ++k) {
+    for (std::uint32_t k = 1; k <= n(); k += kStep) {
         for (int i = 0; i < scaled(6); ++i) {
             List list = randomSubset(k, engine);
             expectPlainDesign({n(), list});
@@ -132,7 +135,7 @@ TEST_P(EveryNumberOfFactors, CategoricalSubsetsAscendingAndShuffled) {
 
 TEST_P(EveryNumberOfFactors, RepeatedCategoricalFactors) {
     std::mt19937 engine(1000 + n());
-    for (std::uint32_t k = 2; k <= n(); ++k) {
+    for (std::uint32_t k = 2; k <= n(); k += kStep) {
         for (int i = 0; i < scaled(6); ++i) {
             List list = randomSubset(k, engine);
             for (std::uint32_t& column : list) {
