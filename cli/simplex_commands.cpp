@@ -19,31 +19,32 @@ struct LatticeOptions {
     MixtureOptions mixture;
 };
 
-double choose(double n, double k) {
+/// A binomial coefficient as a double: a count may exceed every integer before it is refused.
+double choose(std::size_t n, std::size_t k) {
     double count = 1;
-    for (double i = 1; i <= k; ++i)
-        count = count * (n - k + i) / i;
+    for (std::size_t i = 1; i <= k; ++i)
+        count = count * static_cast<double>(n - k + i) / static_cast<double>(i);
     return std::round(count);
 }
 
 /// Runs of a centroid design: C(q, t) points of type t, the last of which is the overall centroid.
 double countCentroidRuns(const MixtureRequest& request) {
-    const auto q = static_cast<double>(request.components.size());
+    const std::size_t q = request.components.size();
     std::vector<double> points;
-    for (double t = 1; t < q; ++t)
+    for (std::size_t t = 1; t < q; ++t)
         points.push_back(choose(q, t));
-    return request.countRuns(points, 1, request.axial ? q : 0);
+    return request.countRuns(points, 1, request.axial ? static_cast<double>(q) : 0);
 }
 
 /// Runs of a lattice design: C(q, t) C(m-1, t-1) mixtures of degree m have t nonzero proportions.
-double countLatticeRuns(const MixtureRequest& request, double degree, bool center) {
-    const auto q = static_cast<double>(request.components.size());
+double countLatticeRuns(const MixtureRequest& request, std::size_t degree, bool center) {
+    const std::size_t q = request.components.size();
     std::vector<double> points;
-    for (double t = 1; t <= q && t <= degree; ++t)
+    for (std::size_t t = 1; t <= q && t <= degree; ++t)
         points.push_back(choose(q, t) * choose(degree - 1, t - 1));
-    const bool holdsCentroid = std::fmod(degree, q) == 0;
+    const bool holdsCentroid = degree % q == 0;
     if (holdsCentroid) points.back() -= 1;
-    return request.countRuns(points, holdsCentroid || center ? 1 : 0, request.axial ? q : 0);
+    return request.countRuns(points, holdsCentroid || center ? 1 : 0, request.axial ? static_cast<double>(q) : 0);
 }
 
 void runCentroid(const MixtureOptions& options) {
@@ -60,7 +61,8 @@ void runLattice(const LatticeOptions& options) {
     checkOutputFile(options.mixture.shared.output.file, options.mixture.shared.output.force);
     const MixtureRequest request = readRequest(options.mixture);
     if (options.degree < 1) throw UsageError("--degree", "the degree of a lattice is at least 1");
-    options.mixture.shared.checkRunCount(countLatticeRuns(request, options.degree, options.center));
+    options.mixture.shared.checkRunCount(
+        countLatticeRuns(request, static_cast<std::size_t>(options.degree), options.center));
     const MixtureRecord record = makeRecord(request);
     checkMixtureCode(des_RunSimplexLatticeDesign(record.get(), options.degree, options.center ? 1 : 0), request);
     reportTightenedBounds(record, request);
