@@ -42,7 +42,7 @@ double countLatticeRuns(const MixtureRequest& request, std::size_t degree, bool 
     std::vector<double> points;
     for (std::size_t t = 1; t <= q && t <= degree; ++t)
         points.push_back(choose(q, t) * choose(degree - 1, t - 1));
-    const bool holdsCentroid = degree % q == 0;
+    const bool holdsCentroid = q != 0 && degree % q == 0;
     if (holdsCentroid) points.back() -= 1;
     return request.countRuns(points, holdsCentroid || center ? 1 : 0, request.axial ? static_cast<double>(q) : 0);
 }
