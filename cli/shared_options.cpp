@@ -49,6 +49,10 @@ void addOutputOptions(CLI::App& command, OutputOptions& options) {
         ->capture_default_str()
         ->type_name("FORMAT")
         ->group(kOutputGroup);
+    command
+        .add_flag_callback(
+            "--json", [&options] { options.format = "json"; }, "The same as --format json")
+        ->group(kOutputGroup);
     command.add_option("--decimal-mark", options.decimalMark, "Decimal mark of tables and CSV: . or ,")
         ->check(CLI::IsMember({".", ","}))
         ->capture_default_str()

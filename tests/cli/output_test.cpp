@@ -60,6 +60,16 @@ TEST(CsvOutput, UsesTheDecimalMark) {
     EXPECT_EQ(runs[0].at("a"), "1,5");
 }
 
+TEST(JsonOutput, HasAShortOption) {
+    const std::vector<std::string> design = {"dsd", "--factors", "3", "--standard-order"};
+    auto longForm = design;
+    longForm.insert(longForm.end(), {"--format", "json"});
+    auto shortForm = design;
+    shortForm.emplace_back("--json");
+    EXPECT_EQ(runReisti(shortForm).out, runReisti(longForm).out);
+    EXPECT_EQ(runReisti(shortForm).out.front(), '{');
+}
+
 TEST(JsonOutput, IgnoresTheDecimalMark) {
     const auto design =
         jsonOf({"dsd", "--factor", "a=1:2", "--factor", "b=0:1", "--standard-order", "--decimal-mark", ","});
