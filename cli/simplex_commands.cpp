@@ -76,6 +76,9 @@ void addCentroidCommand(CLI::App& app) {
     CLI::App* command =
         app.add_subcommand("centroid", "Simplex centroid design: the centroids of all subsets of components");
     const auto options = std::make_shared<MixtureOptions>();
+    // Every mixture command takes it, so that a script can change the kind of design and nothing else.
+    command->add_flag_callback(
+        "--center", [] {}, "Changes nothing: the overall centroid is always a point of this design");
     addMixtureOptions(*command, *options);
     command->footer(
         "Columns: std_order, run_order, point_type (1 vertex, k blend of k components, 0 overall\n"

@@ -28,6 +28,15 @@ TEST(CentroidCommand, ShowsTheSevenBlendsOfThreeComponents) {
     }
 }
 
+TEST(CentroidCommand, HoldsTheCentroidWithOrWithoutAskingForIt) {
+    const std::vector<std::string> plain = {"centroid", "--component", "a", "--component",
+                                            "b",        "--component", "c", "--standard-order"};
+    std::vector<std::string> asked = plain;
+    asked.emplace_back("--center");
+    EXPECT_EQ(csvRuns(asked), csvRuns(plain));
+    EXPECT_EQ(csvRuns(asked).back().at("point_type"), "0");
+}
+
 TEST(CentroidCommand, ShowsAmountsOfATotalWithinTheBoundsAndTellsWhatItTightened) {
     const std::vector<std::string> command = {"centroid",      "--component",   "watermelon=20:100",
                                               "--component",   "pineapple=10:", "--component",
