@@ -47,6 +47,8 @@
 
 #include <stdint.h>
 
+/** @def REISTI_API
+ * Marks what the shared library exports; a host need not use it. */
 #if defined(__GNUC__)
 #define REISTI_API __attribute__((visibility("default")))
 #else
@@ -130,7 +132,9 @@ enum {
     des_ScreeningPointOneZero = 2
 };
 
-/** One run of a screening design. Record and levels belong to the caller. */
+/** @brief One run of a screening design.
+ *
+ * Record and levels belong to the caller. */
 typedef struct des_DefinitiveScreeningRun {
     /** Out. 1-based position in which to run it: the index in `runs` plus 1 unless the design is randomized. */
     uint32_t runOrder;
@@ -143,7 +147,9 @@ typedef struct des_DefinitiveScreeningRun {
     int32_t* levels;
 } des_DefinitiveScreeningRun;
 
-/** A screening design: request and result. Everything belongs to the caller; no input field is changed. */
+/** @brief A screening design: request and result.
+ *
+ * Everything belongs to the caller; no input field is changed. */
 typedef struct des_DefinitiveScreeningDesign {
     /** In. Number of factors n, 2..48. */
     uint32_t numFactors;
@@ -196,13 +202,13 @@ REISTI_API uint32_t des_FindDefinitiveScreeningDesignRowCount(int32_t numFactors
  * The tests are made in this order; the first that fails decides.
  *
  * @param design the request; its `runs` hold at least as many records as the row count, each with levels[numFactors]
- * @retval des_ErrorNullPointer        design is null; nothing written
+ * @retval des_ErrorNullPointer        design is null; nothing written. Or, tested after des_ErrorTooManyCategorical,
+ *                                     numCategorical is nonzero and `categoricalFactors` null; the even base runs are
+ *                                     written
  * @retval des_ErrorNullRuns           `runs` is null; nothing written
  * @retval des_ErrorNumFactors         fewer than 2 or more than 48 factors; nothing written
  * @retval des_ErrorNullLevels         `levels` of the first run is null; nothing written
  * @retval des_ErrorTooManyCategorical more categorical factors than factors; the even base runs 0, 2, .., 2s-2 are
- *                                     written
- * @retval des_ErrorNullPointer        numCategorical is nonzero and `categoricalFactors` null; the even base runs are
  *                                     written
  * @retval des_ErrorCategoricalIndex   an index is not below numFactors; the even base runs are written
  * @retval des_ErrorTooManyReplicates  the runs cannot be counted in 32 bits; the base runs are complete
@@ -238,7 +244,9 @@ enum {
     des_MixturePointVertex = 1
 };
 
-/** One run of a mixture design. Record and arrays belong to the library. */
+/** @brief One run of a mixture design.
+ *
+ * Record and arrays belong to the library. */
 typedef struct des_MixtureRun {
     /** Out. 1-based position in which to run it: the index in `runs` plus 1 unless the design is randomized. */
     uint32_t runOrder;
@@ -255,10 +263,10 @@ typedef struct des_MixtureRun {
     int32_t* processLevels;
 } des_MixtureRun;
 
-/**
- * A mixture design: request and result. q is `numComponents`. The library allocates and frees the record and `runs`;
- * all other arrays are the caller's and have to be there before a run, also those that a run only writes.
- */
+/** @brief A mixture design: request and result.
+ *
+ * q is `numComponents`. The library allocates and frees the record and `runs`; all other arrays are the caller's and
+ * have to be there before a run, also those that a run only writes. */
 typedef struct des_MixtureDesign {
     /** In, 3 after creation. Number of components q. */
     uint32_t numComponents;
@@ -324,8 +332,9 @@ typedef struct des_MixtureDesign {
     des_MixtureRun* runs;
 } des_MixtureDesign;
 
-/** A linear constraint lowerValue <= coefficients . x <= upperValue on the components. Record and coefficients belong
- * to the caller. */
+/** @brief A linear constraint lowerValue <= coefficients . x <= upperValue on the components x.
+ *
+ * Record and coefficients belong to the caller. */
 typedef struct des_MixtureDesignLinearConstraint {
     /** In, flag. Nonzero when the lower side holds. Zero makes the constraint an upper one, whatever hasUpperValue
      * says. */
@@ -436,8 +445,9 @@ REISTI_API int32_t des_RunExtremeVerticesDesign(des_MixtureDesign* design, int32
 /* Fractional factorial catalog                                                                                     */
 /* ---------------------------------------------------------------------------------------------------------------- */
 
-/** A two-level factorial design, or a regular fraction of one, from which process variables are laid out. Factors are
- * named A to H and J to P in order; the first log2(numRuns) are the base factors. */
+/** @brief A two-level factorial design, or a regular fraction of one, from which process variables are laid out.
+ *
+ * Factors are named A to H and J to P in order; the first log2(numRuns) are the base factors. */
 typedef struct des_FractionalFactorial {
     /** Number of factors. */
     int32_t numFactors;
