@@ -3,7 +3,6 @@
 #include <gtest/gtest.h>
 #include <map>
 #include <numeric>
-#include <thread>
 #include <vector>
 
 #include "reisti/reisti.h"
@@ -200,23 +199,6 @@ TEST(RandomBounds, OfAnyKindGiveThePlainOutcome) {
     for (const std::int32_t code : {des_Success, des_ErrorLowerBoundSum, des_ErrorUpperBoundSum, des_ErrorUpperBound,
                                     des_ErrorEmptyRange, des_ErrorNotSimplex})
         EXPECT_GT(codes[code], 0) << code;
-}
-
-TEST(ConcurrentRuns, OnDifferentRecordsDoNotDisturbEachOther) {
-    MixtureRequest request = latticeRequest(6, 4, 1);
-    request.axialPoints = request.randomize = 1;
-    request.seed = 9.0;
-    request.numProcessVariables = 5;
-    request.processFraction = 4;
-    const MixtureOutcome alone = builtDesign(request);
-    std::vector<MixtureOutcome> together(4);
-    std::vector<std::thread> threads;
-    for (auto& outcome : together)
-        threads.emplace_back([&] { outcome = builtDesign(request); });
-    for (auto& thread : threads)
-        thread.join();
-    for (const auto& outcome : together)
-        EXPECT_TRUE(sameOutcome(outcome, alone));
 }
 
 }  // namespace

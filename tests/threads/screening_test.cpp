@@ -1,26 +1,24 @@
-// Calls on different records run at the same time without disturbing each other.
+// Screening designs, whose random orders draw on shared sources of seeds.
 #include <algorithm>
-#include <atomic>
 #include <cstddef>
 #include <cstdint>
 #include <gtest/gtest.h>
 #include <memory>
 #include <numeric>
-#include <thread>
 #include <vector>
 
 #include "reisti/reisti.h"
 #include "support/scale.h"
 #include "support/screening_arrays.h"
+#include "threads/in_parallel.h"
 
 namespace {
 
+using reisti::test::inParallel;
 using reisti::test::scaled;
 using reisti::test::ScreeningArrays;
 using reisti::test::plain::PlainRun;
 using reisti::test::plain::Request;
-
-constexpr std::size_t kThreads = 4;
 
 Request requestNumber(std::uint32_t number) {
     Request request{2 + number % 47};
@@ -37,27 +35,6 @@ std::unique_ptr<ScreeningArrays> arraysNumber(std::uint32_t number) {
     auto arrays = std::make_unique<ScreeningArrays>(requestNumber(number));
     arrays->randomized(1.0 + number).design.randomize = number % 2 == 0;
     return arrays;
-}
-
-/// Calls work(number) for all numbers, dealt to the threads in turn.
-template <typename Work>
-void inParallel(std::size_t count, Work work) {
-    std::atomic<bool> start = false;
-    std::vector<std::thread> threads;
-    for (std::size_t t = 0; t < kThreads; ++t) {
-        threads.emplace_back([&, t] {
-            while (!start) {
-                std::this_thread::yield();
-            }
-            for (std::size_t i = t; i < count; i += kThreads) {
-                work(i);
-            }
-        });
-    }
-    start = true;
-    for (std::thread& thread : threads) {
-        thread.join();
-    }
 }
 
 TEST(ManyThreads, BuildTheDesignsThatOneThreadBuilds) {
