@@ -1,18 +1,20 @@
 #ifndef REISTI_TESTS_SUPPORT_ADDRESS_SPACE_LIMIT_H
 #define REISTI_TESTS_SUPPORT_ADDRESS_SPACE_LIMIT_H
 
+#include <cstddef>
+#include <sys/mman.h>
 #include <sys/resource.h>
 
 namespace reisti::test {
 
 /// Sanitizers reserve terabytes of addresses and answer huge allocations in their own way: no limit there.
 #if defined(__SANITIZE_ADDRESS__) || defined(__SANITIZE_THREAD__)
-inline constexpr bool kCanLimitMemory = false;
+inline constexpr bool kSanitizerHoldsMemory = true;
 #elif defined(__has_feature)
-inline constexpr bool kCanLimitMemory =
-    !(__has_feature(address_sanitizer) || __has_feature(thread_sanitizer) || __has_feature(memory_sanitizer));
+inline constexpr bool kSanitizerHoldsMemory =
+    __has_feature(address_sanitizer) || __has_feature(thread_sanitizer) || __has_feature(memory_sanitizer);
 #else
-inline constexpr bool kCanLimitMemory = true;
+inline constexpr bool kSanitizerHoldsMemory = false;
 #endif
 
 /// Limits the memory of the process while it lives: what a test asks for too much of fails here on any machine, instead
@@ -32,6 +34,17 @@ class AddressSpaceLimit {
   private:
     rlimit before_{};
 };
+
+/// Whether a limit holds here: sanitizers live above it, and emulators of other processors ignore it.
+inline bool canLimitMemory() {
+    if (kSanitizerHoldsMemory) return false;
+    constexpr std::size_t kLimit = std::size_t{4} << 30;
+    const AddressSpaceLimit limit(kLimit);
+    void* const block = mmap(nullptr, 2 * kLimit, PROT_NONE, MAP_PRIVATE | MAP_ANONYMOUS | MAP_NORESERVE, -1, 0);
+    if (block == MAP_FAILED) return true;
+    munmap(block, 2 * kLimit);
+    return false;
+}
 
 }  // namespace reisti::test
 
