@@ -14,7 +14,7 @@ ADDED_TEST = re.compile(r"\badd_test\(\s*NAME\s+([^\s)]+)")
 OPERATORS = {"&&", "||", "|", ";"}
 FLAGS = {
     "cmake": {"--build", "--install", "--workflow", "--preset", "--target", "--prefix", "--component", "--list-presets",
-              "--fresh", "-j"},
+              "--fresh", "-j", "-S", "-B"},
     "ctest": {"--preset", "-R", "-E", "-N", "-V", "-j", "--output-on-failure"},
     "gdb": {"--args"},
 }
@@ -93,7 +93,11 @@ def check_tool(tree, words):
             position += 1
             if following not in {f"build/{name}" for name in tree.presets["configurePresets"]}:
                 yield f"not the build folder of a preset: {following}"
-        elif word in ("--prefix", "--component", "-j"):
+        elif word == "-S":
+            position += 1
+            if pathlib.Path(following) not in tree.lists:
+                yield f"{following} has no CMakeLists.txt"
+        elif word in ("-B", "--prefix", "--component", "-j"):
             position += 1
         position += 1
 

@@ -122,6 +122,16 @@ class Quotes(CheckDocs):
         self.assert_refused("```cmake\nfind_package(reisti)\n```\n", 2, "in no file of the build")
 
 
+    def test_a_block_that_names_a_file_is_all_of_it(self):
+        self.assert_accepted(f"```c examples/host.c\n{TREE['examples/host.c']}```\n")
+        self.assert_refused("```c examples/host.c\n    return des_Version();\n```\n", 2, "not the whole of")
+        self.assert_refused("```c examples/guest.c\n    return des_Version();\n```\n", 2, "does not exist")
+
+    def test_refreshing_copies_a_file(self):
+        self.assertEqual(self.check("```c examples/host.c\nold\n```\n", refresh=True), [])
+        self.assertEqual(self.page.read_text(), f"```c examples/host.c\n{TREE['examples/host.c']}```\n")
+
+
 class UncheckedBlocks(CheckDocs):
     def test_an_unknown_language_is_refused(self):
         self.assert_refused("```python\nprint()\n```\n", 2, "\"python\" is not checked")
@@ -160,7 +170,7 @@ class Commands(CheckDocs):
     def test_commands_that_name_what_exists_are_accepted(self):
         for command in ("scripts/demo", "scripts/demo --quick", "cmake --workflow --preset dev",
                         "cmake --preset dev -DREISTI_DEVELOPER=ON && cmake --build --preset dev --target unit_dsd",
-                        "ctest --preset dev -R RowCount", "ctest --preset dev -R '^CHost'",
+                        "cmake -S examples -B build/examples", "ctest --preset dev -R RowCount", "ctest --preset dev -R '^CHost'",
                         "build/dev/tests/unit/dsd/unit_dsd --gtest_filter='RowCount.*'",
                         "gdb --args build/dev/tests/unit/dsd/unit_dsd"):
             with self.subTest(command):
@@ -175,6 +185,7 @@ class Commands(CheckDocs):
                                ("cmake --build --preset dev --target unit", "no such target"),
                                ("cmake --preset dev -DREISTI_DEV=ON", "no such setting"),
                                ("cmake --preset dev --trace", "not known"),
+                               ("cmake -S samples -B build/samples", "no CMakeLists.txt"),
                                ("ctest --preset dev -R Rows", "no test matches"),
                                ("build/dev/tests/unit/unit_dsd", "no such program"),
                                ("build/dev/tests/unit/dsd/unit_dsd --gtest_filter='Rows.*'", "no test matches"),
