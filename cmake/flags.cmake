@@ -9,7 +9,7 @@ target_compile_options(reisti_flags INTERFACE
 
 # reisti_warnings serves developers only; it is never exported.
 add_library(reisti_warnings INTERFACE)
-if(REISTI_DEVELOPER)
+if(REISTI_DEVELOPER OR REISTI_BUILD_FUZZERS)
   target_compile_options(reisti_warnings INTERFACE
     -Wall -Wextra -Wpedantic -Werror -Wshadow
     $<$<COMPILE_LANGUAGE:CXX>:-Wconversion -Wsign-conversion -Wnon-virtual-dtor -Wold-style-cast>)

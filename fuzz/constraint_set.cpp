@@ -1,0 +1,135 @@
+#include "constraint_set.h"
+
+#include <algorithm>
+#include <cmath>
+#include <numeric>
+#include <span>
+
+#include "draw.h"
+#include "require.h"
+#include "same_bytes.h"
+
+namespace fuzz {
+
+namespace {
+
+constexpr std::int32_t kUntouched = 77;
+constexpr std::int32_t kLowerIdle = 1;
+constexpr std::int32_t kUpperIdle = 2;
+constexpr std::int32_t kBothIdle = 3;
+
+/// A vertex this far outside a plane still counts as on it; the documented tolerance is a little smaller.
+constexpr double kOutsideAbsolute = 2e-6;
+
+/// Larger numbers in a constraint leave too few digits of a proportion.
+constexpr double kModerate = 1e3;
+
+using Constraint = des_MixtureDesignLinearConstraint;
+
+std::vector<double> drawCoefficients(FuzzedDataProvider& bytes, std::uint32_t numComponents) {
+    std::vector<double> coefficients(numComponents);
+    const bool isAwkward = drawRarely(bytes, 4);
+    for (double& coefficient : coefficients)
+        coefficient = isAwkward ? drawNumber(bytes) : bytes.ConsumeIntegralInRange(-4, 4) / 2.0;
+    return coefficients;
+}
+
+double drawSide(FuzzedDataProvider& bytes, double total) {
+    return drawRarely(bytes, 8) ? drawNumber(bytes) : drawHundredths(bytes, -100, 100) * total;
+}
+
+bool hasUpperSide(const Constraint& constraint) {
+    return constraint.hasLowerValue == 0 || constraint.hasUpperValue != 0;
+}
+
+bool isModerate(const Constraint& constraint, std::uint32_t numComponents, double total) {
+    const auto isSmall = [](double number) { return std::fabs(number) <= kModerate; };
+    return std::all_of(constraint.coefficients, constraint.coefficients + numComponents, isSmall) &&
+           (constraint.hasLowerValue == 0 || isSmall(constraint.lowerValue / total)) &&
+           (!hasUpperSide(constraint) || isSmall(constraint.upperValue / total));
+}
+
+bool hasSameInputs(const Constraint& a, const Constraint& b) {
+    const double left[] = {a.lowerValue, a.upperValue};
+    const double right[] = {b.lowerValue, b.upperValue};
+    return a.hasLowerValue == b.hasLowerValue && a.hasUpperValue == b.hasUpperValue &&
+           a.coefficients == b.coefficients && haveSameBytes(left, right);
+}
+
+std::vector<std::int32_t> allowedStatuses(const Constraint& constraint) {
+    if (constraint.hasLowerValue == 0) return {kUntouched, kUpperIdle};
+    if (constraint.hasUpperValue == 0) return {kUntouched, kLowerIdle};
+    return {kUntouched, kLowerIdle, kUpperIdle, kBothIdle};
+}
+
+}  // namespace
+
+ConstraintSet::ConstraintSet(FuzzedDataProvider& bytes, std::uint32_t numComponents, std::size_t count, double total) {
+    for (std::size_t i = 0; i < count; ++i) {
+        const std::uint8_t flags = bytes.ConsumeIntegral<std::uint8_t>();
+        Constraint constraint{};
+        constraint.hasLowerValue = flags & 0x2C;
+        constraint.hasUpperValue = flags & 0xD1;
+        coefficients_.push_back(drawCoefficients(bytes, numComponents));
+        constraint.coefficients = coefficients_.back().data();
+        if (drawRarely(bytes, 64)) constraint.coefficients = nullptr;
+        constraint.lowerValue = drawSide(bytes, total);
+        constraint.upperValue = drawSide(bytes, total);
+        constraint.status = kUntouched;
+        requested_.push_back(constraint);
+    }
+    records_ = requested_;
+}
+
+Constraint* ConstraintSet::prepare() {
+    records_ = requested_;
+    return records_.data();
+}
+
+bool ConstraintSet::hasAllCoefficients() const {
+    return std::ranges::all_of(requested_, [](const Constraint& one) { return one.coefficients != nullptr; });
+}
+
+bool ConstraintSet::hasNumbers() const {
+    const auto isFinite = [](double number) { return std::isfinite(number); };
+    const auto hasNaN = [](const Constraint& one) { return std::isnan(one.lowerValue) || std::isnan(one.upperValue); };
+    return std::ranges::none_of(requested_, hasNaN) &&
+           std::ranges::all_of(coefficients_, [&](const auto& row) { return std::ranges::all_of(row, isFinite); });
+}
+
+bool ConstraintSet::areStatusesUntouched() const {
+    return std::ranges::all_of(records_, [](const Constraint& one) { return one.status == kUntouched; });
+}
+
+void ConstraintSet::checkRecords() const {
+    for (std::size_t i = 0; i < records_.size(); ++i) {
+        const auto allowed = allowedStatuses(requested_[i]);
+        require(std::ranges::find(allowed, records_[i].status) != allowed.end(),
+                "a status speaks of a side that the constraint has");
+        require(hasSameInputs(records_[i], requested_[i]), "a run changes no constraint but its status");
+    }
+}
+
+void ConstraintSet::checkRuns(const des_MixtureDesign& design, double total) const {
+    const std::uint32_t q = design.numComponents;
+    for (const Constraint& constraint : records_) {
+        if (!isModerate(constraint, q, total)) continue;
+        const bool lowerCuts =
+            constraint.hasLowerValue != 0 && (constraint.status == kUntouched || constraint.status == kUpperIdle);
+        const bool upperCuts =
+            hasUpperSide(constraint) && (constraint.status == kUntouched || constraint.status == kLowerIdle);
+        for (const des_MixtureRun& run : std::span(design.runs, design.numRuns)) {
+            // Amounts are proportions of the run's own total.
+            const bool isAmount = design.outputUnits == des_UnitsAmount && design.numAmounts != 0;
+            const double value =
+                std::inner_product(constraint.coefficients, constraint.coefficients + q, run.proportions, 0.0) /
+                (isAmount ? run.amount : 1.0);
+            require(!lowerCuts || value >= constraint.lowerValue / total - kOutsideAbsolute,
+                    "runs are above the lower side of a constraint that cuts");
+            require(!upperCuts || value <= constraint.upperValue / total + kOutsideAbsolute,
+                    "runs are below the upper side of a constraint that cuts");
+        }
+    }
+}
+
+}  // namespace fuzz
