@@ -1,5 +1,9 @@
 # Header, shared library, program, CMake package, pkg-config file and manual pages. Components follow the usual Debian split.
 include(CMakePackageConfigHelpers)
+include(man_pages)
+if(REISTI_DEBIAN_PACKAGES)
+  include(debian)
+endif()
 
 set(package_dir ${CMAKE_INSTALL_LIBDIR}/cmake/reisti)
 
@@ -21,16 +25,16 @@ configure_file(packaging/reisti.pc.in ${PROJECT_BINARY_DIR}/reisti.pc @ONLY)
 install(FILES ${PROJECT_BINARY_DIR}/reisti.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig COMPONENT development)
 
 # man finds the page of the C interface under the name of each function.
-install(FILES packaging/man/reisti.3 DESTINATION ${CMAKE_INSTALL_MANDIR}/man3 COMPONENT development)
+reisti_install_man_page(packaging/man/reisti.3 development)
 file(STRINGS abi/exports.txt functions)
 foreach(function IN LISTS functions)
   file(CONFIGURE OUTPUT ${PROJECT_BINARY_DIR}/man/${function}.3 CONTENT ".so man3/reisti.3\n")
-  install(FILES ${PROJECT_BINARY_DIR}/man/${function}.3 DESTINATION ${CMAKE_INSTALL_MANDIR}/man3 COMPONENT development)
+  reisti_install_man_page(${PROJECT_BINARY_DIR}/man/${function}.3 development)
 endforeach()
 
 if(REISTI_BUILD_CLI)
   file(RELATIVE_PATH from_program_to_library /${CMAKE_INSTALL_BINDIR} /${CMAKE_INSTALL_LIBDIR})
   set_target_properties(reisti_cli PROPERTIES INSTALL_RPATH "$ORIGIN/${from_program_to_library}")
   install(TARGETS reisti_cli RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR} COMPONENT tools)
-  install(FILES packaging/man/reisti.1 DESTINATION ${CMAKE_INSTALL_MANDIR}/man1 COMPONENT tools)
+  reisti_install_man_page(packaging/man/reisti.1 tools)
 endif()

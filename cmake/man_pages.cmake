@@ -1,0 +1,10 @@
+# reisti_install_man_page(FILE COMPONENT): plain, as installations from source are; compressed in Debian packages.
+function(reisti_install_man_page file component)
+  cmake_path(GET file FILENAME name)
+  cmake_path(GET file EXTENSION LAST_ONLY extension)
+  string(SUBSTRING ${extension} 1 -1 section)
+  if(REISTI_DEBIAN_PACKAGES)
+    reisti_compress(${file} ${name}.gz file)
+  endif()
+  install(FILES ${file} DESTINATION ${CMAKE_INSTALL_MANDIR}/man${section} COMPONENT ${component})
+endfunction()
