@@ -82,9 +82,10 @@ def check_tool(tree, words):
             if following not in tree.presets[preset_kind(words)]:
                 yield f"no such preset in {preset_kind(words)}: {following}"
         elif word == "--target":
-            position += 1
-            if not tree.has_target(following):
-                yield f"no such target: {following}"
+            while position + 1 < len(words) and not words[position + 1].startswith("-"):
+                position += 1
+                if not tree.has_target(words[position]):
+                    yield f"no such target: {words[position]}"
         elif word in ("-R", "-E"):
             position += 1
             if not any(re.search(following, test) for test in tree.tests):

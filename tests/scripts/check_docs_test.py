@@ -170,7 +170,7 @@ class Commands(CheckDocs):
     def test_commands_that_name_what_exists_are_accepted(self):
         for command in ("scripts/demo", "scripts/demo --quick", "cmake --workflow --preset dev",
                         "cmake --preset dev -DREISTI_DEVELOPER=ON && cmake --build --preset dev --target unit_dsd",
-                        "cmake -S examples -B build/examples", "ctest --preset dev -R RowCount", "ctest --preset dev -R '^CHost'",
+                        "cmake --build --preset dev --target unit_dsd unit_dsd -j 2", "cmake -S examples -B build/examples", "ctest --preset dev -R RowCount", "ctest --preset dev -R '^CHost'",
                         "build/dev/tests/unit/dsd/unit_dsd --gtest_filter='RowCount.*'",
                         "gdb --args build/dev/tests/unit/dsd/unit_dsd"):
             with self.subTest(command):
@@ -182,7 +182,7 @@ class Commands(CheckDocs):
     def test_commands_that_name_what_does_not_exist_are_refused(self):
         for command, words in (("scripts/demos", "no such script"), ("scripts/demo --slow", "does not know --slow"),
                                ("cmake --preset base", "no such preset"), ("ctest --preset release", "no such preset"),
-                               ("cmake --build --preset dev --target unit", "no such target"),
+                               ("cmake --build --preset dev --target unit_dsd unit", "no such target: unit"),
                                ("cmake --preset dev -DREISTI_DEV=ON", "no such setting"),
                                ("cmake --preset dev --trace", "not known"),
                                ("cmake -S samples -B build/samples", "no CMakeLists.txt"),
@@ -214,6 +214,10 @@ class Sentences(CheckDocs):
     def test_functions_exist(self):
         self.assert_accepted("`des_Version`, all of `des_...`\n")
         self.assert_refused("des_Versions\n", 1, "not in the public header")
+
+    def test_tests_exist(self):
+        self.assert_accepted("`RowCount.OfSixFactorsIsThirteen`, `CHost.Builds`, `std.map`\n")
+        self.assert_refused("`RowCount.OfSevenFactors`\n", 1, "no test RowCount.OfSevenFactors")
 
     def test_options_and_commands_of_the_program_exist(self):
         self.assert_accepted("`reisti dsd --factors 6`, `reisti COMMAND --help`, `--quick`, `--factors`\n")

@@ -38,7 +38,7 @@ TEST(ErrorTable, HoldsEveryCodeOfTheHeaderUnderItsName) {
         table[entry.code] = entry.name;
     }
     EXPECT_EQ(table, codesOfTheHeader());
-    EXPECT_GE(table.size(), 19U);
+    EXPECT_FALSE(table.empty());
 }
 
 TEST(ErrorTable, AscendsWithoutRepetition) {
@@ -58,26 +58,31 @@ TEST(ErrorTable, TextsAreDifferentSentences) {
     }
 }
 
+// Hosts have the numbers compiled in. They stand here once more so that none changes unseen.
 TEST(ErrorCodes, AreThePublishedNumbers) {
-    EXPECT_EQ(des_Success, 0);
-    EXPECT_EQ(des_ErrorNumFactors, 30001);
-    EXPECT_EQ(des_ErrorTooManyReplicates, 30002);
-    EXPECT_EQ(des_ErrorTooManyCategorical, 30003);
-    EXPECT_EQ(des_ErrorCategoricalIndex, 30004);
-    EXPECT_EQ(des_ErrorBlocks, 30005);
-    EXPECT_EQ(des_ErrorNullRuns, 30006);
-    EXPECT_EQ(des_ErrorNullLevels, 30007);
-    EXPECT_EQ(des_ErrorLowerBoundSum, 30008);
-    EXPECT_EQ(des_ErrorUpperBoundSum, 30009);
-    EXPECT_EQ(des_ErrorUpperBound, 30010);
-    EXPECT_EQ(des_ErrorEmptyRange, 30011);
-    EXPECT_EQ(des_ErrorNotSimplex, 30012);
-    EXPECT_EQ(des_ErrorProcessFraction, 30013);
-    EXPECT_EQ(des_ErrorAmountsAndProcess, 30014);
-    EXPECT_EQ(des_ErrorDegree, 30015);
-    EXPECT_EQ(des_ErrorTooManyPoints, 30016);
-    EXPECT_EQ(des_ErrorOutOfMemory, 30017);
-    EXPECT_EQ(des_ErrorNullPointer, 30018);
+    const std::map<std::int32_t, std::string> published = {
+        {0, "des_Success"},
+        {30001, "des_ErrorNumFactors"},
+        {30002, "des_ErrorTooManyReplicates"},
+        {30003, "des_ErrorTooManyCategorical"},
+        {30004, "des_ErrorCategoricalIndex"},
+        {30005, "des_ErrorBlocks"},
+        {30006, "des_ErrorNullRuns"},
+        {30007, "des_ErrorNullLevels"},
+        {30008, "des_ErrorLowerBoundSum"},
+        {30009, "des_ErrorUpperBoundSum"},
+        {30010, "des_ErrorUpperBound"},
+        {30011, "des_ErrorEmptyRange"},
+        {30012, "des_ErrorNotSimplex"},
+        {30013, "des_ErrorProcessFraction"},
+        {30014, "des_ErrorAmountsAndProcess"},
+        {30015, "des_ErrorDegree"},
+        {30016, "des_ErrorTooManyPoints"},
+        {30017, "des_ErrorOutOfMemory"},
+        {30018, "des_ErrorNullPointer"},
+        {30019, "des_ErrorNotANumber"},
+    };
+    EXPECT_EQ(codesOfTheHeader(), published);
 }
 
 TEST(ErrorMessage, IsTheTextOfTheTable) {
