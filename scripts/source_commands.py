@@ -38,7 +38,14 @@ class Tree:
 
     def has_target(self, name, folder=None):
         texts = self.lists.values() if folder is None else [self.lists.get(folder, "")]
-        return any(re.search(rf"(?<![\w-]){re.escape(name)}(?![\w-])", text) for text in texts)
+        return any(self.is_named(name, text) for text in texts)
+
+    @staticmethod
+    def is_named(name, text):
+        # A function of the build may make the name up, as "${name}_fuzzer".
+        stem, _, ending = name.rpartition("_")
+        word = stem if stem and f"${{name}}_{ending}" in text else name
+        return re.search(rf"(?<![\w-]){re.escape(word)}(?![\w-])", text) is not None
 
     def has_program(self, path):
         """A program below build/PRESET: its folder in the tree names it as a target."""

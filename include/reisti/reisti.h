@@ -427,7 +427,8 @@ REISTI_API int32_t des_RunSimplexLatticeDesign(des_MixtureDesign* design, int32_
  * @param numConstraints number of constraints; a negative number counts as 0
  * @param constraints    [numConstraints] the caller's constraints, whose `status` is written; may be null when there
  *                       are none
- * @param maxPoints      most vertices and centroids that the caller accepts; 0 or negative for no limit
+ * @param maxPoints      most vertices and centroids together that the caller accepts, looked at as centroids are added:
+ *                       vertices alone never exceed it; 0 or negative for no limit
  * @retval des_ErrorDegree        degree is negative or above q; nothing changed
  * @retval des_ErrorNullPointer   also when constraints are missing or one has no coefficients; nothing changed
  * @retval des_ErrorNotANumber    a constraint holds NaN or an infinite coefficient; nothing changed. Or a bound is not

@@ -36,6 +36,7 @@ TREE = {
     "tests/install/build_consumer": "cc -std=c99 host.c \\\n    -lreisti\n",
     "tests/unit/dsd/CMakeLists.txt": "reisti_add_test(NAME unit_dsd)\nadd_test(NAME CHost.Builds COMMAND unit_dsd)\n",
     "tests/unit/dsd/rows_test.cpp": "TEST(RowCount, OfSixFactorsIsThirteen) {}\n",
+    "fuzz/CMakeLists.txt": "add_executable(${name}_fuzzer)\nadd_fuzzer(rows)\n",
     "CMakeLists.txt": "option(REISTI_DEVELOPER \"\" OFF)\n",
     "CMakePresets.json": json.dumps({
         "configurePresets": [{"name": "base", "hidden": True}, {"name": "dev"}],
@@ -172,7 +173,7 @@ class Commands(CheckDocs):
                         "cmake --preset dev -DREISTI_DEVELOPER=ON && cmake --build --preset dev --target unit_dsd",
                         "cmake --build --preset dev --target unit_dsd unit_dsd -j 2", "cmake -S examples -B build/examples", "ctest --preset dev -R RowCount", "ctest --preset dev -R '^CHost'",
                         "build/dev/tests/unit/dsd/unit_dsd --gtest_filter='RowCount.*'",
-                        "gdb --args build/dev/tests/unit/dsd/unit_dsd"):
+                        "build/dev/fuzz/rows_fuzzer", "gdb --args build/dev/tests/unit/dsd/unit_dsd"):
             with self.subTest(command):
                 self.assert_accepted(f"```sh\n{command}\n```\n")
 
@@ -188,6 +189,7 @@ class Commands(CheckDocs):
                                ("cmake -S samples -B build/samples", "no CMakeLists.txt"),
                                ("ctest --preset dev -R Rows", "no test matches"),
                                ("build/dev/tests/unit/unit_dsd", "no such program"),
+                               ("build/dev/fuzz/lines_fuzzer", "no such program"),
                                ("build/dev/tests/unit/dsd/unit_dsd --gtest_filter='Rows.*'", "no test matches"),
                                ("scripts/demo && make", "make is not known"), ("echo 'open", "No closing quotation")):
             with self.subTest(command):
