@@ -6,6 +6,7 @@
 #include <span>
 
 #include "draw.h"
+#include "mixture_checks.h"
 #include "require.h"
 #include "same_bytes.h"
 
@@ -119,11 +120,10 @@ void ConstraintSet::checkRuns(const des_MixtureDesign& design, double total) con
         const bool upperCuts =
             hasUpperSide(constraint) && (constraint.status == kUntouched || constraint.status == kLowerIdle);
         for (const des_MixtureRun& run : std::span(design.runs, design.numRuns)) {
-            // Amounts are proportions of the run's own total.
-            const bool isAmount = design.outputUnits == des_UnitsAmount && design.numAmounts != 0;
+            const double sum = sumOfProportions(design, run);
+            if (!isTotalModerate(sum)) continue;
             const double value =
-                std::inner_product(constraint.coefficients, constraint.coefficients + q, run.proportions, 0.0) /
-                (isAmount ? run.amount : 1.0);
+                std::inner_product(constraint.coefficients, constraint.coefficients + q, run.proportions, 0.0) / sum;
             require(!lowerCuts || value >= constraint.lowerValue / total - kOutsideAbsolute,
                     "runs are above the lower side of a constraint that cuts");
             require(!upperCuts || value <= constraint.upperValue / total + kOutsideAbsolute,

@@ -92,7 +92,7 @@ void checkDesign(const VerticesRequest& request, const des_MixtureDesign& design
         fuzz::require(points <= std::max<double>(vertices, request.maxPoints), "no more points than accepted");
 
     const double total = fuzz::totalOf(request.mixture);
-    if (design.outputUnits <= des_UnitsProportion && fuzz::areBoundsModerate(design) && total > 0)
+    if (design.outputUnits <= des_UnitsProportion && fuzz::areBoundsModerate(design) && fuzz::isTotalModerate(total))
         request.constraints.checkRuns(design, total);
 }
 

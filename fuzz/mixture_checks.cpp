@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <cstring>
 #include <limits>
 #include <numeric>
 #include <span>
@@ -97,14 +96,15 @@ void checkPointCounts(const MixtureRequest& request, const MixtureEngine& engine
     }
 
     // Entry 0: axial points; 1: the centroid; t + 1: type t.
+    const auto placeOf = [](std::int64_t type) { return static_cast<std::size_t>(type + 1); };
     std::vector<double> runs(q + 2, 0.0);
     for (const des_MixtureRun& run : runsOf(design)) {
         require(run.pointType >= -1 && run.pointType <= static_cast<std::int64_t>(q), "point types are -1 to q");
-        ++runs[static_cast<std::size_t>(run.pointType + 1)];
+        ++runs[placeOf(run.pointType)];
     }
     const double repeats = countRepeats(request);
     const auto check = [&](double distinct, std::int32_t type) {
-        require(runs[static_cast<std::size_t>(type + 1)] == distinct * replicatesOf(request, type) * repeats,
+        require(runs[placeOf(type)] == distinct * replicatesOf(request, type) * repeats,
                 "each point is run as often as asked");
     };
     check(points.axial, des_MixturePointAxial);
@@ -165,11 +165,6 @@ bool isModerate(double number) {
     return std::fabs(number) <= kModerate;
 }
 
-/// Whether a total divides and multiplies bounds without taking digits away.
-bool isTotalModerate(double total) {
-    return total >= 1 / kModerate && total <= kModerate;
-}
-
 void checkBounds(const MixtureRequest& request, const des_MixtureDesign& design) {
     const double total = totalOf(request);
     for (std::uint32_t i = 0; i < design.numComponents; ++i) {
@@ -189,11 +184,6 @@ void checkBounds(const MixtureRequest& request, const des_MixtureDesign& design)
         require(design.boundsAdjusted != 0 || (raised <= tolerance && lowered <= tolerance),
                 "the flag tells when a bound was tightened");
     }
-}
-
-/// What the proportions of a run sum to, in the units asked for.
-double sumOfProportions(const des_MixtureDesign& design, const des_MixtureRun& run) {
-    return design.outputUnits == des_UnitsAmount && design.numAmounts != 0 ? run.amount : 1.0;
 }
 
 void checkProportions(const des_MixtureDesign& design) {
@@ -235,7 +225,7 @@ void checkDesign(const MixtureRequest& request, const MixtureEngine& engine, con
 bool areSameRuns(const des_MixtureDesign& a, const des_MixtureDesign& b) {
     return std::ranges::equal(runsOf(a), runsOf(b), [&](const des_MixtureRun& left, const des_MixtureRun& right) {
         return left.runOrder == right.runOrder && left.pointType == right.pointType &&
-               std::memcmp(&left.amount, &right.amount, sizeof left.amount) == 0 &&
+               haveSameBytes(std::span(&left.amount, 1), std::span(&right.amount, 1)) &&
                haveSameBytes(proportionsOf(a, left), proportionsOf(b, right)) &&
                std::ranges::equal(processLevelsOf(a, left), processLevelsOf(b, right));
     });
@@ -297,9 +287,17 @@ void checkRun(const MixtureRequest& request, const MixtureEngine& engine) {
             "the same request, the same runs");
 }
 
+bool isTotalModerate(double total) {
+    return total >= 1 / kModerate && total <= kModerate;
+}
+
 bool areBoundsModerate(const des_MixtureDesign& design) {
     return std::all_of(design.scaledLowerBounds, design.scaledLowerBounds + design.numComponents, isModerate) &&
            std::all_of(design.scaledUpperBounds, design.scaledUpperBounds + design.numComponents, isModerate);
+}
+
+double sumOfProportions(const des_MixtureDesign& design, const des_MixtureRun& run) {
+    return design.outputUnits == des_UnitsAmount && design.numAmounts != 0 ? run.amount : 1.0;
 }
 
 }  // namespace fuzz

@@ -49,8 +49,14 @@ std::vector<std::int32_t> mixtureCodes();
 /// the time runs it again and compares.
 void checkRun(const MixtureRequest& request, const MixtureEngine& engine);
 
+/// Whether a total multiplies and divides proportions without taking digits away.
+bool isTotalModerate(double total);
+
 /// Whether rounding leaves the bounds of a finished design enough digits to compare proportions with them.
 bool areBoundsModerate(const des_MixtureDesign& design);
+
+/// What the proportions of a run sum to in the units that were asked for.
+double sumOfProportions(const des_MixtureDesign& design, const des_MixtureRun& run);
 
 }  // namespace fuzz
 
