@@ -2,8 +2,10 @@
 
 #include <algorithm>
 #include <cmath>
+#include <numbers>
 #include <numeric>
 #include <span>
+#include <utility>
 
 #include "draw.h"
 #include "mixture_checks.h"
@@ -50,6 +52,38 @@ bool isModerate(const Constraint& constraint, std::uint32_t numComponents, doubl
            (!hasUpperSide(constraint) || isSmall(constraint.upperValue / total));
 }
 
+/// The half-space normal . x >= offset.
+struct Plane {
+    std::vector<double> normal;
+    double offset;
+};
+
+Plane opposite(const std::vector<double>& normal, double offset) {
+    Plane plane{normal, -offset};
+    for (double& component : plane.normal)
+        component = -component;
+    return plane;
+}
+
+/// The sides that the call has not found idle.
+void appendCuttingPlanes(const Constraint& constraint, std::uint32_t numComponents, double total,
+                         std::vector<Plane>& planes) {
+    const std::vector<double> normal(constraint.coefficients, constraint.coefficients + numComponents);
+    const bool isLowerIdle = constraint.status == kLowerIdle || constraint.status == kBothIdle;
+    const bool isUpperIdle = constraint.status == kUpperIdle || constraint.status == kBothIdle;
+    if (constraint.hasLowerValue != 0 && !isLowerIdle) planes.push_back({normal, constraint.lowerValue / total});
+    if (hasUpperSide(constraint) && !isUpperIdle) planes.push_back(opposite(normal, constraint.upperValue / total));
+}
+
+void appendBounds(const des_MixtureDesign& design, std::vector<Plane>& planes) {
+    for (std::uint32_t j = 0; j < design.numComponents; ++j) {
+        std::vector<double> normal(design.numComponents, 0.0);
+        normal[j] = 1;
+        planes.push_back({normal, design.scaledLowerBounds[j]});
+        planes.push_back(opposite(normal, design.scaledUpperBounds[j]));
+    }
+}
+
 bool hasSameInputs(const Constraint& a, const Constraint& b) {
     const double left[] = {a.lowerValue, a.upperValue};
     const double right[] = {b.lowerValue, b.upperValue};
@@ -71,15 +105,33 @@ ConstraintSet::ConstraintSet(FuzzedDataProvider& bytes, std::uint32_t numCompone
         Constraint constraint{};
         constraint.hasLowerValue = flags & 0x2C;
         constraint.hasUpperValue = flags & 0xD1;
-        coefficients_.push_back(drawCoefficients(bytes, numComponents));
-        constraint.coefficients = coefficients_.back().data();
-        if (drawRarely(bytes, 64)) constraint.coefficients = nullptr;
+        std::vector<double> coefficients = drawCoefficients(bytes, numComponents);
         constraint.lowerValue = drawSide(bytes, total);
         constraint.upperValue = drawSide(bytes, total);
-        constraint.status = kUntouched;
-        requested_.push_back(constraint);
+        add(constraint, std::move(coefficients));
+        if (drawRarely(bytes, 64)) requested_.back().coefficients = nullptr;
     }
-    records_ = requested_;
+}
+
+ConstraintSet ConstraintSet::drawPolygon(FuzzedDataProvider& bytes, std::size_t count, double total) {
+    ConstraintSet polygon;
+    Constraint side{};
+    side.upperValue = drawHundredths(bytes, 5, 40) * total;
+    for (std::size_t i = 0; i < count; ++i) {
+        const double angle = 2 * std::numbers::pi * static_cast<double>(i) / static_cast<double>(count);
+        // Two orthogonal directions within the triangle of mixtures.
+        const double u = std::cos(angle) / std::sqrt(2.0);
+        const double v = std::sin(angle) / std::sqrt(6.0);
+        polygon.add(side, {u + v, v - u, -2 * v});
+    }
+    return polygon;
+}
+
+void ConstraintSet::add(const Constraint& constraint, std::vector<double> coefficients) {
+    coefficients_.push_back(std::move(coefficients));
+    requested_.push_back(constraint);
+    requested_.back().coefficients = coefficients_.back().data();
+    requested_.back().status = kUntouched;
 }
 
 Constraint* ConstraintSet::prepare() {
@@ -113,22 +165,23 @@ void ConstraintSet::checkRecords() const {
 
 void ConstraintSet::checkRuns(const des_MixtureDesign& design, double total) const {
     const std::uint32_t q = design.numComponents;
+    std::vector<Plane> planes;
     for (const Constraint& constraint : records_) {
-        if (!isModerate(constraint, q, total)) continue;
-        const bool lowerCuts =
-            constraint.hasLowerValue != 0 && (constraint.status == kUntouched || constraint.status == kUpperIdle);
-        const bool upperCuts =
-            hasUpperSide(constraint) && (constraint.status == kUntouched || constraint.status == kLowerIdle);
-        for (const des_MixtureRun& run : std::span(design.runs, design.numRuns)) {
-            const double sum = sumOfProportions(design, run);
-            if (!isTotalModerate(sum)) continue;
-            const double value =
-                std::inner_product(constraint.coefficients, constraint.coefficients + q, run.proportions, 0.0) / sum;
-            require(!lowerCuts || value >= constraint.lowerValue / total - kOutsideAbsolute,
-                    "runs are above the lower side of a constraint that cuts");
-            require(!upperCuts || value <= constraint.upperValue / total + kOutsideAbsolute,
-                    "runs are below the upper side of a constraint that cuts");
+        if (!isModerate(constraint, q, total)) return;
+        appendCuttingPlanes(constraint, q, total, planes);
+    }
+    appendBounds(design, planes);
+    for (const des_MixtureRun& run : std::span(design.runs, design.numRuns)) {
+        const double sum = sumOfProportions(design, run);
+        if (!isTotalModerate(sum)) continue;
+        std::size_t touched = 0;
+        for (const Plane& plane : planes) {
+            const double inside =
+                std::inner_product(plane.normal.begin(), plane.normal.end(), run.proportions, 0.0) / sum - plane.offset;
+            require(inside >= -kOutsideAbsolute, "runs are within the sides that cut");
+            if (inside <= kOutsideAbsolute) ++touched;
         }
+        if (run.pointType == des_MixturePointVertex) require(touched + 1 >= q, "a vertex is where enough planes meet");
     }
 }
 

@@ -14,6 +14,10 @@ namespace fuzz {
 class ConstraintSet {
   public:
     ConstraintSet(FuzzedDataProvider& bytes, std::uint32_t numComponents, std::size_t count, double total);
+
+    /// A polygon around the centroid of three components, each side of which cuts.
+    static ConstraintSet drawPolygon(FuzzedDataProvider& bytes, std::size_t count, double total);
+
     ~ConstraintSet() = default;
     ConstraintSet(const ConstraintSet&) = delete;
     ConstraintSet& operator=(const ConstraintSet&) = delete;
@@ -32,10 +36,13 @@ class ConstraintSet {
     /// Checks that a call has written nothing but allowed statuses.
     void checkRecords() const;
 
-    /// Checks that every run is within the sides that cut the region.
+    /// Checks that every run is within the sides that cut the region, and each vertex on as many planes as make one.
     void checkRuns(const des_MixtureDesign& design, double total) const;
 
   private:
+    ConstraintSet() = default;
+    void add(const des_MixtureDesignLinearConstraint& constraint, std::vector<double> coefficients);
+
     std::vector<std::vector<double>> coefficients_;
     std::vector<des_MixtureDesignLinearConstraint> requested_;
     std::vector<des_MixtureDesignLinearConstraint> records_;

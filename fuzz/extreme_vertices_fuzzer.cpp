@@ -2,6 +2,7 @@
 #include <cmath>
 #include <limits>
 #include <numeric>
+#include <utility>
 
 #include "constraint_set.h"
 #include "draw.h"
@@ -31,24 +32,67 @@ std::int32_t drawMaxPoints(FuzzedDataProvider& bytes) {
     return fuzz::drawRarely(bytes, 8) ? bytes.ConsumeIntegral<std::int32_t>() : 0;
 }
 
-VerticesRequest drawVerticesRequest(FuzzedDataProvider& bytes) {
-    const std::uint32_t q = bytes.ConsumeIntegralInRange(0, 8) != 0 ? bytes.ConsumeIntegralInRange(2U, 5U)
-                                                                    : bytes.ConsumeIntegralInRange(0U, 8U);
-    const std::int32_t degree = drawDegree(bytes, q);
+/// A call on a request and constraints that fit it.
+VerticesRequest drawCall(FuzzedDataProvider& bytes, fuzz::MixtureRequest mixture, std::int32_t degree,
+                         fuzz::ConstraintSet constraints) {
     const auto centerPoint = bytes.ConsumeIntegral<std::uint8_t>();
     const std::int32_t maxPoints = drawMaxPoints(bytes);
-    // Many planes take few components, so that the vertices stay few.
-    const std::size_t mostConstraints = q <= 3 && fuzz::drawRarely(bytes, 8) ? 80 : 5;
-    const auto count = bytes.ConsumeIntegralInRange<std::size_t>(0, mostConstraints);
     const bool hasArray = !fuzz::drawRarely(bytes, 32);
-    std::int32_t numConstraints = static_cast<std::int32_t>(count);
-    if (count == 0 || !hasArray) numConstraints = bytes.ConsumeIntegralInRange(-2, hasArray ? 0 : 100);
-    fuzz::MixtureRequest mixture = fuzz::drawMixtureRequest(bytes, q);
-    fuzz::ConstraintSet constraints(bytes, q, count, fuzz::totalOf(mixture));
+    std::int32_t numConstraints = static_cast<std::int32_t>(constraints.size());
+    if (numConstraints == 0 || !hasArray) numConstraints = bytes.ConsumeIntegralInRange(-2, hasArray ? 0 : 100);
     return {std::move(mixture), degree, centerPoint, numConstraints, hasArray, maxPoints, std::move(constraints)};
 }
 
-/// Only a bound on the number of points is known before the vertices are.
+VerticesRequest drawOrdinary(FuzzedDataProvider& bytes) {
+    const std::uint32_t q = bytes.ConsumeIntegralInRange(0, 8) != 0 ? bytes.ConsumeIntegralInRange(2U, 5U)
+                                                                    : bytes.ConsumeIntegralInRange(0U, 8U);
+    const std::int32_t degree = drawDegree(bytes, q);
+    fuzz::MixtureRequest mixture = fuzz::drawMixtureRequest(bytes, q);
+    const auto count = bytes.ConsumeIntegralInRange<std::size_t>(0, 5);
+    fuzz::ConstraintSet constraints(bytes, q, count, fuzz::totalOf(mixture));
+    return drawCall(bytes, std::move(mixture), degree, std::move(constraints));
+}
+
+/// More planes than there are bits in a word.
+VerticesRequest drawManyPlanes(FuzzedDataProvider& bytes) {
+    constexpr std::uint32_t kTriangle = 3;
+    const std::int32_t degree = drawDegree(bytes, kTriangle);
+    fuzz::MixtureRequest mixture = fuzz::drawMixtureRequest(bytes, kTriangle);
+    const auto count = bytes.ConsumeIntegralInRange<std::size_t>(40, 150);
+    fuzz::ConstraintSet polygon = fuzz::ConstraintSet::drawPolygon(bytes, count, fuzz::totalOf(mixture));
+    return drawCall(bytes, std::move(mixture), degree, std::move(polygon));
+}
+
+/// So many vertices that trying all pairs of them would take long.
+VerticesRequest drawManyVertices(FuzzedDataProvider& bytes) {
+    const auto q = bytes.ConsumeIntegralInRange(8U, 10U);
+    fuzz::MixtureRequest mixture = fuzz::drawMixtureRequest(bytes, q);
+    mixture.lowerBounds.assign(q, 0.0);
+    mixture.upperBounds.assign(q, fuzz::drawHundredths(bytes, 15, 40) * fuzz::totalOf(mixture));
+    const auto count = bytes.ConsumeIntegralInRange<std::size_t>(1, 2);
+    fuzz::ConstraintSet constraints(bytes, q, count, fuzz::totalOf(mixture));
+    return drawCall(bytes, std::move(mixture), 1, std::move(constraints));
+}
+
+VerticesRequest drawVerticesRequest(FuzzedDataProvider& bytes) {
+    switch (bytes.ConsumeIntegralInRange(0, 15)) {
+        case 14:
+            return drawManyPlanes(bytes);
+        case 15:
+            return drawManyVertices(bytes);
+        default:
+            return drawOrdinary(bytes);
+    }
+}
+
+/// Only a rough bound on the number of points is known before the vertices are.
+double mostPoints(const VerticesRequest& request) {
+    constexpr double kMostVertices = 4096;
+    if (request.constraints.size() > 5) return 2.0 * static_cast<double>(request.constraints.size());
+    const double faces = std::exp2(2.0 * request.mixture.inputs.numComponents);
+    return request.degree <= 1 ? std::min(faces, kMostVertices) : faces;
+}
+
 fuzz::Cost costOf(const VerticesRequest& request) {
     constexpr double kMostRuns = 65'536;
     const fuzz::MixtureRequest& mixture = request.mixture;
@@ -57,8 +101,7 @@ fuzz::Cost costOf(const VerticesRequest& request) {
     double replicates = 1;
     for (std::int64_t type = des_MixturePointAxial; type <= mixture.inputs.numComponents; ++type)
         replicates = std::max(replicates, fuzz::replicatesOf(mixture, type));
-    const double points = std::exp2(2.0 * mixture.inputs.numComponents);
-    return points * replicates * repeats > kMostRuns ? fuzz::Cost::kTooLarge : fuzz::Cost::kSmall;
+    return mostPoints(request) * replicates * repeats > kMostRuns ? fuzz::Cost::kTooLarge : fuzz::Cost::kSmall;
 }
 
 std::int32_t codeOfConstraints(const VerticesRequest& request) {
@@ -92,7 +135,8 @@ void checkDesign(const VerticesRequest& request, const des_MixtureDesign& design
         fuzz::require(points <= std::max<double>(vertices, request.maxPoints), "no more points than accepted");
 
     const double total = fuzz::totalOf(request.mixture);
-    if (design.outputUnits <= des_UnitsProportion && fuzz::areBoundsModerate(design) && fuzz::isTotalModerate(total))
+    if (request.numConstraints > 0 && design.outputUnits <= des_UnitsProportion && fuzz::areBoundsModerate(design) &&
+        fuzz::isTotalModerate(total))
         request.constraints.checkRuns(design, total);
 }
 

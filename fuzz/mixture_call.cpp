@@ -1,6 +1,7 @@
 #include "mixture_call.h"
 
-#include <cstring>
+#include <span>
+#include <tuple>
 
 #include "require.h"
 #include "same_bytes.h"
@@ -33,6 +34,18 @@ CallerArrays makeArrays(const MixtureRequest& request) {
             .typeReplicates = request.typeReplicates.value_or(std::vector<std::uint32_t>())};
 }
 
+bool areEqual(const des_MixtureDesign& a, const des_MixtureDesign& b) {
+    const auto fields = [](const des_MixtureDesign& d) {
+        return std::tie(d.numComponents, d.lowerBounds, d.upperBounds, d.scaledLowerBounds, d.scaledUpperBounds,
+                        d.pseudoLowerBounds, d.pseudoUpperBounds, d.pointsPerType, d.numCenterPoints, d.numAxialPoints,
+                        d.boundaryCounts, d.vertexReplicates, d.typeReplicates, d.centerReplicates, d.axialReplicates,
+                        d.designReplicates, d.reserved, d.numProcessVariables, d.processFraction, d.fractionIndex,
+                        d.numAmounts, d.amounts, d.axialPoints, d.boundsAdjusted, d.outputUnits, d.randomize, d.numRuns,
+                        d.runs);
+    };
+    return fields(a) == fields(b) && haveSameBytes(std::span(&a.seed, 1), std::span(&b.seed, 1));
+}
+
 }  // namespace
 
 MixtureCall::MixtureCall(const MixtureRequest& request, const Function& function)
@@ -41,7 +54,7 @@ MixtureCall::MixtureCall(const MixtureRequest& request, const Function& function
     *design_ = request.inputs;
     pointAtArrays();
     if (request.missingArray) leaveOut(*request.missingArray);
-    std::memcpy(&designBefore_, design_, sizeof designBefore_);
+    designBefore_ = *design_;
     code_ = function(design_);
 }
 
@@ -87,8 +100,7 @@ void MixtureCall::leaveOut(std::size_t array) {
 }
 
 bool MixtureCall::isNothingChanged() const {
-    return std::memcmp(design_, &designBefore_, sizeof designBefore_) == 0 &&
-           haveSameBytes(arrays_.lowerBounds, arraysBefore_.lowerBounds) &&
+    return areEqual(*design_, designBefore_) && haveSameBytes(arrays_.lowerBounds, arraysBefore_.lowerBounds) &&
            haveSameBytes(arrays_.upperBounds, arraysBefore_.upperBounds) &&
            haveSameBytes(arrays_.scaledLowerBounds, arraysBefore_.scaledLowerBounds) &&
            haveSameBytes(arrays_.scaledUpperBounds, arraysBefore_.scaledUpperBounds) &&
@@ -104,14 +116,13 @@ bool MixtureCall::areRunsUntouched() const {
 
 void MixtureCall::checkInputsUnchanged() const {
     // Everything that a run may change put back, the rest has to be what it was.
-    des_MixtureDesign inputs;
-    std::memcpy(&inputs, design_, sizeof inputs);
+    des_MixtureDesign inputs = *design_;
     inputs.numCenterPoints = designBefore_.numCenterPoints;
     inputs.numAxialPoints = designBefore_.numAxialPoints;
     inputs.boundsAdjusted = designBefore_.boundsAdjusted;
     inputs.numRuns = designBefore_.numRuns;
     inputs.runs = designBefore_.runs;
-    require(std::memcmp(&inputs, &designBefore_, sizeof inputs) == 0, "a run changes no input field");
+    require(areEqual(inputs, designBefore_), "a run changes no input field");
     require(haveSameBytes(arrays_.amounts, arraysBefore_.amounts), "a run changes no amount");
     require(arrays_.typeReplicates == arraysBefore_.typeReplicates, "a run changes no replicates");
 }

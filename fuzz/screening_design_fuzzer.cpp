@@ -1,5 +1,4 @@
 #include <algorithm>
-#include <cstring>
 #include <fuzzer/FuzzedDataProvider.h>
 #include <map>
 #include <numeric>
@@ -19,7 +18,7 @@ using fuzz::ScreeningCall;
 using fuzz::ScreeningRequest;
 
 constexpr std::uint32_t kMostListed = 64;
-constexpr std::uint32_t kMostRuns = 1'000;
+constexpr std::uint32_t kMostRuns = 400;
 
 void drawCategoricalFactors(FuzzedDataProvider& bytes, ScreeningRequest& request) {
     const std::uint32_t n = request.inputs.numFactors;
@@ -45,7 +44,6 @@ void drawCategoricalFactors(FuzzedDataProvider& bytes, ScreeningRequest& request
 ScreeningRequest drawScreeningRequest(FuzzedDataProvider& bytes) {
     ScreeningRequest request;
     des_DefinitiveScreeningDesign& inputs = request.inputs;
-    std::memset(&inputs, 0, sizeof inputs);
     inputs.numFactors = bytes.ConsumeIntegralInRange(0U, 50U);
     inputs.replicates = fuzz::drawCount(bytes, 8);
     inputs.numBlocks = fuzz::drawCount(bytes, 8);
