@@ -109,7 +109,19 @@ static void errors(void) {
     des_DeleteMixtureDesignContainer(NULL);
 }
 
+static void catalogOfFractions(void) {
+    uint32_t count = 0;
+    const des_FractionalFactorial* entries = des_FractionalFactorialCatalog(&count);
+    expect(entries != NULL && count > 0, "the catalog has entries");
+    for (uint32_t i = 0; i < count; ++i) {
+        expect(entries[i].numRuns > 0 && (entries[i].numRuns & (entries[i].numRuns - 1)) == 0, "a power of two runs");
+        expect(entries[i].generators != NULL && entries[i].blockGenerators != NULL, "words, if only an empty text");
+    }
+    expect(des_FractionalFactorialCatalog(NULL) == entries, "the count need not be asked for");
+}
+
 int main(void) {
+    catalogOfFractions();
     centroidWithAxialPoints();
     latticeWithTotalAndProcessVariables();
     errors();
