@@ -1,22 +1,10 @@
 """What scripts/check-docs accepts and refuses, on a small tree with a program that prints its arguments."""
-import importlib.machinery
-import importlib.util
 import json
 import pathlib
-import sys
 import tempfile
 import unittest
 
-SCRIPTS = pathlib.Path(__file__).resolve().parents[2] / "scripts"
-
-
-def load(name):
-    sys.path.insert(0, str(SCRIPTS))
-    loader = importlib.machinery.SourceFileLoader(name.replace("-", "_"), str(SCRIPTS / name))
-    module = importlib.util.module_from_spec(importlib.util.spec_from_loader(loader.name, loader))
-    loader.exec_module(module)
-    return module
-
+from loading import load
 
 CHECK_DOCS = load("check-docs")
 
