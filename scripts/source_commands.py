@@ -28,9 +28,11 @@ class Tree:
         presets = json.loads((self.root / "CMakePresets.json").read_text())
         self.presets = {kind: {preset["name"] for preset in presets.get(kind, []) if not preset.get("hidden")}
                         for kind in ("configurePresets", "buildPresets", "testPresets", "workflowPresets")}
-        lists = [file for file in self.root.rglob("CMakeLists.txt") if "build" not in file.relative_to(self.root).parts]
+        # Not rglob from the top, which would go through every build.
+        folders = [file for file in self.root.iterdir() if file.is_dir() and file.name not in ("build", ".git")]
+        lists = [self.root / "CMakeLists.txt", *(file for folder in folders for file in folder.rglob("CMakeLists.txt"))]
         self.lists = {file.parent.relative_to(self.root): file.read_text() for file in lists}
-        self.settings = (self.root / "CMakeLists.txt").read_text()
+        self.settings = self.lists[pathlib.Path(".")]
         self.tests = {name for text in self.lists.values() for name in ADDED_TEST.findall(text)}
         for file in (self.root / "tests").rglob("*.cpp"):
             for match in TEST.finditer(file.read_text()):

@@ -20,6 +20,7 @@ TREE = {
     "scripts/demo": "#!/bin/sh\n# usage: scripts/demo [--quick]\n",
     "include/reisti/reisti.h": "int des_Version(void);\n",
     "examples/host.c": "int main(void) {\n    return des_Version();\n}\n",
+    "src/table.cpp": "namespace lib { int numFactors; }\nconst char* column = \"std_order\";\n",
     "examples/CMakeLists.txt": "find_package(reisti REQUIRED)\n",
     "tests/install/build_consumer": "cc -std=c99 host.c \\\n    -lreisti\n",
     "tests/unit/dsd/CMakeLists.txt": "reisti_add_test(NAME unit_dsd)\nadd_test(NAME CHost.Builds COMMAND unit_dsd)\n",
@@ -108,7 +109,7 @@ class Quotes(CheckDocs):
 
     def test_a_build_file_is_quoted_word_for_word(self):
         self.assert_accepted("```cmake\nfind_package(reisti REQUIRED)\n```\n")
-        self.assert_refused("```cmake\nfind_package(reisti)\n```\n", 2, "in no file of the build")
+        self.assert_refused("```cmake\nfind_package(reisti)\n```\n", 2, "in no CMakeLists.txt")
 
 
     def test_a_block_that_names_a_file_is_all_of_it(self):
@@ -204,6 +205,11 @@ class Sentences(CheckDocs):
     def test_functions_exist(self):
         self.assert_accepted("`des_Version`, all of `des_...`\n")
         self.assert_refused("des_Versions\n", 1, "not in the public header")
+
+    def test_names_exist(self):
+        self.assert_accepted("`numFactors`, `lib::numFactors`, `std_order`, `vertices`, `q`, `Debian 12`\n")
+        self.assert_refused("`numFactor`\n", 1, "nothing is called numFactor")
+        self.assert_refused("| `lib::factors` |\n", 1, "nothing is called lib::factors")
 
     def test_tests_exist(self):
         self.assert_accepted("`RowCount.OfSixFactorsIsThirteen`, `CHost.Builds`, `std.map`\n")
