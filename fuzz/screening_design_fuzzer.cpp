@@ -29,9 +29,10 @@ void drawCategoricalFactors(FuzzedDataProvider& bytes, ScreeningRequest& request
             if (bytes.ConsumeBool()) list.push_back(factor);
     } else {
         list.resize(bytes.ConsumeIntegralInRange(0U, kMostListed));
-        for (std::uint32_t& factor : list)
+        for (std::uint32_t& factor : list) {
             factor = fuzz::drawRarely(bytes, 64) ? bytes.ConsumeIntegral<std::uint32_t>()
                                                  : bytes.ConsumeIntegralInRange(0U, std::max(n, 1U) - 1);
+        }
         if (bytes.ConsumeBool() && list.size() > n) list.resize(n);
     }
     request.inputs.numCategorical = static_cast<std::uint32_t>(list.size());
@@ -147,13 +148,16 @@ void checkReplicates(const ScreeningRequest& request, const ScreeningCall& call)
     const std::uint32_t baseRuns = fuzz::countBaseRuns(inputs.numFactors, hasCategorical(request));
     const bool hasBlocks = inputs.replicates >= 2 && inputs.numBlocks != 0;
     const std::uint32_t replicatesPerBlock = hasBlocks ? inputs.replicates / inputs.numBlocks : UINT32_MAX;
-    for (std::size_t i = 0; i < call.runs().size(); ++i) {
+    for (std::size_t i = 0; i < call.runs().size(); ++i)
         require(call.isWritten(i), "every run is written");
-        const auto replicate = static_cast<std::uint32_t>(i / baseRuns);
-        require(call.runs()[i].block == replicate / replicatesPerBlock + 1, "blocks are made of whole replicates");
-        require(std::equal(call.levels(i), call.levels(i) + inputs.numFactors, call.levels(i % baseRuns)),
-                "replicates repeat the base runs");
-        require(call.runs()[i].pointType == call.runs()[i % baseRuns].pointType, "replicates repeat the point types");
+    for (std::uint32_t replicate = 0; replicate < std::max(inputs.replicates, 1U); ++replicate) {
+        for (std::size_t base = 0; base < baseRuns; ++base) {
+            const std::size_t i = std::size_t{replicate} * baseRuns + base;
+            require(call.runs()[i].block == replicate / replicatesPerBlock + 1, "blocks are made of whole replicates");
+            require(std::equal(call.levels(i), call.levels(i) + inputs.numFactors, call.levels(base)),
+                    "replicates repeat the base runs");
+            require(call.runs()[i].pointType == call.runs()[base].pointType, "replicates repeat the point types");
+        }
     }
 }
 
