@@ -16,8 +16,8 @@ namespace {
 constexpr double kMostCountable = std::numeric_limits<std::uint32_t>::max();
 
 /// What an input may cost, in runs and in numbers written.
-constexpr double kMostRuns = 2'000;
-constexpr double kMostNumbers = 40'000;
+constexpr double kMostRuns = 1'000;
+constexpr double kMostNumbers = 10'000;
 
 /// Proportions are formed by a few operations on numbers of about their size.
 constexpr double kProportionAbsolute = 1e-9;
@@ -187,7 +187,13 @@ void checkBounds(const MixtureRequest& request, const des_MixtureDesign& design)
 }
 
 void checkProportions(const des_MixtureDesign& design) {
-    if (design.outputUnits > des_UnitsPseudo || !areBoundsModerate(design)) return;
+    if (design.outputUnits > des_UnitsPseudo) return;
+    for (const des_MixtureRun& run : runsOf(design)) {
+        require(!isTotalModerate(sumOfProportions(design, run)) ||
+                    std::ranges::all_of(proportionsOf(design, run), [](double share) { return std::isfinite(share); }),
+                "proportions are finite, whatever the bounds");
+    }
+    if (!areBoundsModerate(design)) return;
     const std::size_t q = design.numComponents;
     const bool isPseudo = design.outputUnits == des_UnitsPseudo;
     const double* const lower = isPseudo ? design.pseudoLowerBounds : design.scaledLowerBounds;
