@@ -61,8 +61,8 @@ void checkLateProcessFraction(const MixtureCall& call) {
     for (const des_MixtureRun& run : runsOf(design)) {
         require(std::ranges::all_of(processLevelsOf(design, run), [](std::int32_t level) { return level == 0; }),
                 "runs without a fraction have process levels 0");
-        const auto proportions = proportionsOf(design, run);
-        require(std::accumulate(proportions.begin(), proportions.end(), 0.0) != -1.0, "proportions can be read");
+        require(std::ranges::all_of(proportionsOf(design, run), [](double share) { return std::isfinite(share); }),
+                "every run has proportions that can be read");
     }
 }
 
@@ -125,14 +125,19 @@ void checkRunOrders(const des_MixtureDesign& design) {
     }
 }
 
-/// Standard order repeats the mixtures as a whole: amount after amount, setting after setting.
+/// Standard order repeats the points as a whole: replicate after replicate, amount after amount, setting after setting.
 void checkRepetitions(const MixtureRequest& request, const des_MixtureDesign& design) {
     if (design.numRuns == 0) return;
-    const double outer = countRepeats(request) / request.inputs.designReplicates;
-    const auto mixtures = static_cast<std::uint32_t>(design.numRuns / outer);
+    const auto points = static_cast<std::uint32_t>(design.numRuns / countRepeats(request));
+    const std::uint32_t mixtures = points * request.inputs.designReplicates;
+    const bool isScaled = design.outputUnits != des_UnitsProportion && design.outputUnits != des_UnitsPseudo;
+    const bool isScaledByRun = isScaled && request.amounts.size() > 1;
     for (std::uint32_t i = 0; i < design.numRuns; ++i) {
         const des_MixtureRun& run = design.runs[i];
-        require(run.pointType == design.runs[i % mixtures].pointType, "every amount and setting has the same mixtures");
+        const des_MixtureRun& first = design.runs[i % points];
+        require(run.pointType == first.pointType, "every repetition has the same points");
+        require(isScaledByRun || haveSameBytes(proportionsOf(design, run), proportionsOf(design, first)),
+                "every repetition has the same mixtures");
         const double amount =
             request.amounts.empty() ? 1.0 : request.amounts[request.amounts.size() == 1 ? 0 : i / mixtures];
         require(haveSameBytes(std::span(&run.amount, 1), std::span(&amount, 1)), "a run has the amount of its turn");
