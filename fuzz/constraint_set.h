@@ -27,7 +27,7 @@ class ConstraintSet {
     /// The records for a new call, with poisoned statuses.
     des_MixtureDesignLinearConstraint* prepare();
 
-    std::size_t size() const { return records_.size(); }
+    std::size_t size() const { return requested_.size(); }
     bool hasAllCoefficients() const;
     /// Whether no constraint holds NaN or an infinite coefficient.
     bool hasNumbers() const;
