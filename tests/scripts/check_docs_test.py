@@ -200,6 +200,8 @@ class Sentences(CheckDocs):
 
     def test_paths_exist(self):
         self.assert_accepted("`examples/host.c` and `examples/`, read/write, `and/or`\n")
+        (self.root / "scripts/list.txt").touch()
+        self.assert_accepted("`scripts/list.txt`\n")
         self.assert_refused("`examples/host.cpp`\n", 1, "does not exist")
 
     def test_functions_exist(self):
