@@ -86,6 +86,8 @@ def check_tool(tree, words):
                 yield f"no such setting: {name}"
         elif word not in FLAGS[words[0]]:
             yield f"{words[0]}: {word} is not known to scripts/source_commands.py"
+        elif word == "--build" and following.startswith("build/"):
+            position += 1
         elif word == "--preset":
             position += 1
             if following not in tree.presets[preset_kind(words)]:
