@@ -14,7 +14,7 @@ ADDED_TEST = re.compile(r"\badd_test\(\s*NAME\s+([^\s)]+)")
 OPERATORS = {"&&", "||", "|", ";"}
 FLAGS = {
     "cmake": {"--build", "--install", "--workflow", "--preset", "--target", "--prefix", "--component", "--list-presets",
-              "--fresh", "-j", "-S", "-B"},
+              "--fresh", "-j", "-G", "-S", "-B"},
     "ctest": {"--preset", "-R", "-E", "-N", "-V", "-j", "--output-on-failure"},
     "gdb": {"--args"},
 }
@@ -109,7 +109,7 @@ def check_tool(tree, words):
             position += 1
             if pathlib.Path(following) not in tree.lists:
                 yield f"{following} has no CMakeLists.txt"
-        elif word in ("-B", "--prefix", "--component", "-j"):
+        elif word in ("-B", "-G", "--prefix", "--component", "-j"):
             position += 1
         position += 1
 
