@@ -154,6 +154,15 @@ void checkRepetitions(const MixtureRequest& request, const des_MixtureDesign& de
     }
 }
 
+/// A face of a simplex is a subset of its vertices.
+void checkBoundaryCounts(const MixtureRequest& request, const des_MixtureDesign& design) {
+    if (!isWholeSimplex(request) || design.boundsAdjusted != 0) return;
+    for (std::uint32_t d = 0; d < design.numComponents; ++d) {
+        const double faces = countSubsets(design.numComponents, d + 1);
+        require(faces > kMostCountable || design.boundaryCounts[d] == faces, "the faces of a simplex are counted");
+    }
+}
+
 /// Every column of a regular fraction has as many -1 as +1.
 void checkSettings(const des_MixtureDesign& design) {
     constexpr std::uint32_t kMostTabled = 7;
@@ -228,6 +237,7 @@ void checkDesign(const MixtureRequest& request, const MixtureEngine& engine, con
     checkRunOrders(design);
     checkRepetitions(request, design);
     checkSettings(design);
+    checkBoundaryCounts(request, design);
     checkBounds(request, design);
     if (isTotalModerate(totalOf(request))) checkProportions(design);
     engine.checkDesign(design);

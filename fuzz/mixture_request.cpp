@@ -52,26 +52,26 @@ void scaleBounds(MixtureRequest& request, double total) {
     }
 }
 
-/// Fractions of the whole, so to be multiplied by the total afterwards, except for `any` bounds.
+enum class Region { kWhole, kLowerBounds, kSimplex, kBox, kAny, kOneBound, kMaxValue = kOneBound };
+
+/// Fractions of the whole, to be multiplied by the total afterwards, unless the bounds are any numbers.
 void drawBounds(FuzzedDataProvider& bytes, MixtureRequest& request) {
     const std::uint32_t q = request.inputs.numComponents;
     request.lowerBounds.assign(q, 0.0);
     request.upperBounds.assign(q, 1.0);
-    const int region = bytes.ConsumeIntegralInRange(0, 6);
-    if (q != 0 && q <= kMostBoundedComponents) {
-        if (region == 1) drawLowerBounds(bytes, request);
-        if (region == 2) {
-            drawLowerBounds(bytes, request);
-            implyUpperBounds(request);
-        }
-        if (region == 3 || region == 4) drawBox(bytes, request);
-        if (region == 5) drawAnyBounds(bytes, request);
+    if (q == 0) return;
+    const auto region = bytes.ConsumeEnum<Region>();
+    if (q <= kMostBoundedComponents) {
+        if (region == Region::kLowerBounds || region == Region::kSimplex) drawLowerBounds(bytes, request);
+        if (region == Region::kSimplex) implyUpperBounds(request);
+        if (region == Region::kBox) drawBox(bytes, request);
+        if (region == Region::kAny) drawAnyBounds(bytes, request);
     }
-    if (region == 6 && q != 0) {
+    if (region == Region::kOneBound) {
         const auto at = bytes.ConsumeIntegralInRange<std::size_t>(0, q - 1);
         (bytes.ConsumeBool() ? request.lowerBounds : request.upperBounds)[at] = drawNumber(bytes);
     }
-    if (region != 5 && !request.amounts.empty()) scaleBounds(request, request.amounts[0]);
+    if (region != Region::kAny && !request.amounts.empty()) scaleBounds(request, request.amounts[0]);
 }
 
 void drawProcessVariables(FuzzedDataProvider& bytes, des_MixtureDesign& inputs) {

@@ -1,5 +1,9 @@
+#include <algorithm>
+#include <span>
+
 #include "mixture_checks.h"
 #include "mixture_request.h"
+#include "require.h"
 
 namespace {
 
@@ -14,6 +18,21 @@ fuzz::PointCounts countPoints(const des_MixtureDesign& inputs) {
     return points;
 }
 
+/// In pseudo-components the points are those of the whole simplex, however the region is bounded.
+void checkPseudoComponents(const des_MixtureDesign& design) {
+    if (design.outputUnits != des_UnitsPseudo) return;
+    const std::uint32_t q = design.numComponents;
+    for (const des_MixtureRun& run : std::span(design.runs, design.numRuns)) {
+        if (run.pointType == des_MixturePointAxial) continue;
+        const std::uint32_t size =
+            run.pointType == des_MixturePointCentroid ? q : static_cast<std::uint32_t>(run.pointType);
+        const std::span proportions(run.proportions, q);
+        fuzz::require(
+            std::ranges::count(proportions, 1.0 / size) == size && std::ranges::count(proportions, 0.0) == q - size,
+            "a point of type k has k equal proportions and no other");
+    }
+}
+
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
@@ -23,6 +42,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     engine.codes.push_back(des_ErrorNotSimplex);
     engine.points = countPoints(request.inputs);
     engine.cost = fuzz::costOf(request, *engine.points);
+    engine.checkDesign = checkPseudoComponents;
     fuzz::checkRun(request, engine);
     return 0;
 }

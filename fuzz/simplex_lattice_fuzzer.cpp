@@ -1,9 +1,12 @@
 #include <algorithm>
+#include <cmath>
 #include <limits>
+#include <span>
 
 #include "draw.h"
 #include "mixture_checks.h"
 #include "mixture_request.h"
+#include "require.h"
 
 namespace {
 
@@ -44,6 +47,19 @@ fuzz::PointCounts countPoints(const LatticeRequest& request) {
     return points;
 }
 
+/// In pseudo-components the points are those of the whole simplex, however the region is bounded.
+void checkPseudoComponents(const des_MixtureDesign& design, std::int32_t degree) {
+    if (design.outputUnits != des_UnitsPseudo) return;
+    for (const des_MixtureRun& run : std::span(design.runs, design.numRuns)) {
+        if (run.pointType < des_MixturePointVertex) continue;
+        const std::span proportions(run.proportions, design.numComponents);
+        const auto isMultiple = [=](double share) { return share == std::round(share * degree) / degree; };
+        fuzz::require(std::ranges::all_of(proportions, isMultiple), "proportions are multiples of 1/degree");
+        fuzz::require(std::ranges::count(proportions, 0.0) + run.pointType == design.numComponents,
+                      "a point of type k has k proportions that are not 0");
+    }
+}
+
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
@@ -62,6 +78,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
         engine.points = countPoints(request);
         engine.cost = fuzz::costOf(request.mixture, *engine.points);
     }
+    engine.checkDesign = [&](const des_MixtureDesign& design) { checkPseudoComponents(design, request.degree); };
     fuzz::checkRun(request.mixture, engine);
     return 0;
 }
