@@ -1,4 +1,7 @@
 # One Debian package for each install component, made by cpack. Everything here serves the packages alone.
+if(NOT BUILD_SHARED_LIBS)
+  message(FATAL_ERROR "Debian packages hold the shared library: BUILD_SHARED_LIBS has to be ON")
+endif()
 set(REISTI_DEBIAN_REVISION 1)
 set(REISTI_LIBRARY_PACKAGE libreisti${REISTI_SOVERSION})
 

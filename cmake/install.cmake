@@ -1,16 +1,31 @@
 # Header, shared library, program, CMake package, pkg-config file and manual pages. Components follow the usual Debian split.
 include(CMakePackageConfigHelpers)
-include(man_pages)
+include(${CMAKE_CURRENT_LIST_DIR}/man_pages.cmake)
 if(REISTI_DEBIAN_PACKAGES)
-  include(debian)
+  include(${CMAKE_CURRENT_LIST_DIR}/debian.cmake)
 endif()
 
 set(package_dir ${CMAKE_INSTALL_LIBDIR}/cmake/reisti)
 
 install(TARGETS reisti EXPORT reisti-targets
-  LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT library NAMELINK_COMPONENT development)
+  LIBRARY DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT library NAMELINK_COMPONENT development
+  ARCHIVE DESTINATION ${CMAKE_INSTALL_LIBDIR} COMPONENT development)
 install(DIRECTORY include/reisti DESTINATION ${CMAKE_INSTALL_INCLUDEDIR} COMPONENT development)
 install(EXPORT reisti-targets NAMESPACE reisti:: DESTINATION ${package_dir} COMPONENT development)
+
+# What hosts of a static library link besides. The C runtime comes with every compiler.
+set(REISTI_RUNTIME_LIBRARIES ${CMAKE_CXX_IMPLICIT_LINK_LIBRARIES})
+list(FILTER REISTI_RUNTIME_LIBRARIES EXCLUDE REGEX "^(c|gcc|gcc_s)$")
+list(REMOVE_DUPLICATES REISTI_RUNTIME_LIBRARIES)
+list(TRANSFORM REISTI_RUNTIME_LIBRARIES PREPEND -l OUTPUT_VARIABLE REISTI_PC_PRIVATE_LIBS)
+get_target_property(library_type reisti TYPE)
+set(REISTI_NEEDS_RUV OFF)
+if(REISTI_EXTERNAL_RUV AND library_type STREQUAL STATIC_LIBRARY)
+  set(REISTI_NEEDS_RUV ON)
+  list(PREPEND REISTI_PC_PRIVATE_LIBS -lruv)
+  install(FILES cmake/Findruv.cmake DESTINATION ${package_dir} COMPONENT development)
+endif()
+list(JOIN REISTI_PC_PRIVATE_LIBS " " REISTI_PC_PRIVATE_LIBS)
 
 configure_package_config_file(packaging/reisti-config.cmake.in ${PROJECT_BINARY_DIR}/reisti-config.cmake
   INSTALL_DESTINATION ${package_dir})
