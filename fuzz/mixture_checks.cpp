@@ -200,23 +200,27 @@ void checkBounds(const MixtureRequest& request, const des_MixtureDesign& design)
     }
 }
 
+/// A region that constraints shrink to a point has no pseudo-components.
+constexpr double kLeastFree = 1e-9;
+
 void checkProportions(const des_MixtureDesign& design) {
-    if (design.outputUnits > des_UnitsPseudo) return;
+    const std::size_t q = design.numComponents;
+    const bool isPseudo = design.outputUnits == des_UnitsPseudo;
+    const double free = 1 - std::accumulate(design.scaledLowerBounds, design.scaledLowerBounds + q, 0.0);
+    if (design.outputUnits > des_UnitsPseudo || (isPseudo && free < kLeastFree)) return;
     for (const des_MixtureRun& run : runsOf(design)) {
         require(!isTotalModerate(sumOfProportions(design, run)) ||
                     std::ranges::all_of(proportionsOf(design, run), [](double share) { return std::isfinite(share); }),
                 "proportions are finite, whatever the bounds");
     }
     if (!areBoundsModerate(design)) return;
-    const std::size_t q = design.numComponents;
-    const bool isPseudo = design.outputUnits == des_UnitsPseudo;
+
     const double* const lower = isPseudo ? design.pseudoLowerBounds : design.scaledLowerBounds;
     const double* const upper = isPseudo ? design.pseudoUpperBounds : design.scaledUpperBounds;
     double size = 1;
     for (std::size_t j = 0; j < q; ++j)
         size += std::fabs(lower[j]) + std::fabs(upper[j]);
     // Dividing by what the lower bounds leave free takes as many digits as that is small.
-    const double free = 1 - std::accumulate(design.scaledLowerBounds, design.scaledLowerBounds + q, 0.0);
     const double tolerance = kProportionAbsolute * size * (isPseudo ? std::max(1.0, 1 / free) : 1.0);
     for (const des_MixtureRun& run : runsOf(design)) {
         const double total = sumOfProportions(design, run);
