@@ -3,6 +3,7 @@
 #include <CLI/Validators.hpp>
 #include <algorithm>
 #include <charconv>
+#include <cmath>
 #include <fmt/format.h>
 #include <iostream>
 #include <limits>
@@ -137,6 +138,16 @@ void reportIdleConstraints(const Region& region, const MixtureRecord& points, do
     }
 }
 
+/// What the lower bounds leave free, by which pseudo-components are divided, is 0 where the constraints leave one
+/// point.
+void checkPseudoComponents(const MixtureRecord& record) {
+    if (record->outputUnits != des_UnitsPseudo || record->numRuns == 0) return;
+    const double* const proportions = record.run(0).proportions;
+    const auto isFinite = [](double proportion) { return std::isfinite(proportion); };
+    if (!std::all_of(proportions, proportions + record->numComponents, isFinite))
+        throw RunError("--units pseudo: the constraints leave a single mixture, which has no pseudo-components");
+}
+
 /// The distinct points of the region as proportions, each once, without process variables or further totals: what idle
 /// constraints are judged by and runs are counted from before the design itself is built.
 MixtureRequest distinctPointsOf(const MixtureRequest& request) {
@@ -187,6 +198,7 @@ void runVertices(const VerticesOptions& options) {
     }
     const MixtureRecord record = makeRecord(request);
     runRegion(record, region, request);
+    checkPseudoComponents(record);
     reportTightenedBounds(record, request);
     showMixtureDesign(options.mixture, request, record, describe(region));
 }

@@ -96,6 +96,12 @@ TEST(VerticesCommand, TellsOfAConstraintThatLeavesOnlyAFace) {
     EXPECT_THAT(outcome.err, testing::HasSubstr("leaves only a face"));
 }
 
+TEST(VerticesCommand, RefusesPseudoComponentsOfASingleMixture) {
+    const std::vector<std::string> corner = with(kTriangle, {"--constraint", "A >= 0.999995"});
+    EXPECT_EQ(csvRuns(corner).size(), 1U);
+    expectOneLineError(with(corner, {"--units", "pseudo"}), 1, "--units pseudo");
+}
+
 TEST(VerticesCommand, TellsStatusesBoundsAndCountsInJson) {
     const auto design =
         jsonOf(with(kTriangle, {"--constraint", "A <= 0.5", "--constraint", "A + B <= 2", "--degree", "edges"}));
