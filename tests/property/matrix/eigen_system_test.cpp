@@ -239,6 +239,16 @@ TEST_P(EigenKernels, SolveHugeAndTinyMatricesLikeOrdinaryOnes) {
     }
 }
 
+TEST_P(EigenKernels, SolveMatricesWithOneHugeElementAnywhere) {
+    for (std::size_t i = 0; i < 5; ++i) {
+        for (std::size_t j = 0; j <= i; ++j) {
+            PlainMatrix a(5, 5, 1.0);
+            a(i, j) = a(j, i) = 1e200;
+            expectEigenSystem(a, solve(GetParam(), a), "row " + std::to_string(i) + ", column " + std::to_string(j));
+        }
+    }
+}
+
 TEST_P(EigenKernels, SolveGradedMatricesWithoutLosingOrthogonality) {
     // Rows so small that their squares are subnormal or 0.
     for (const double step : {1e-3, 1e-20, 1e-60, 1e-100, 1e-150}) {

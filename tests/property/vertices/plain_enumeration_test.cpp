@@ -158,6 +158,21 @@ TEST(PlainCuts, OfThousandsOfVerticesAreMetToTheLastBit) {
     }
 }
 
+// The vertices that the first plane makes miss it by rounding, so that they lie on fewer planes than a vertex should.
+TEST(PlainCuts, BehindAPlaneOfHugeCoefficientsAreMetToTheLastBit) {
+    RegionMaker maker(12);
+    PlainRegion region;
+    maker.nominalBounds(10, 0.2, region.lower, region.upper);
+    addCuts(maker, region, 2);
+    PlainConstraint& huge = region.constraints[0];
+    for (double& coefficient : huge.coefficients)
+        coefficient *= 1e13;
+    huge.upper *= 1e13;
+    const EnumeratedRegion expected = plainlyEnumerated(region);
+    EXPECT_EQ(expected.statuses, (std::vector<int>{0, 0})) << "a cut that is none";
+    ASSERT_TRUE(sameEnumeration(enumerated(region), expected)) << describe(region);
+}
+
 class PlainCutsByManyPlanes : public testing::TestWithParam<std::size_t> {};
 
 TEST_P(PlainCutsByManyPlanes, AreMetToTheLastBit) {

@@ -12,6 +12,10 @@ static_assert(std::is_same_v<decltype(std::declval<const Diagonal&>().getCol(0))
 static_assert(std::is_same_v<decltype(std::declval<const Diagonal&>().transpose()), Diagonal>);
 static_assert(std::is_same_v<decltype(-std::declval<const Diagonal&>()), Diagonal>);
 
+TEST(Diagonal, SizeIsTheNumberOfStoredElements) {
+    EXPECT_EQ(diagonal(Vec{1, 2, 3}).size(), 3);
+}
+
 TEST(Diagonal, DefaultHasOrderZero) {
     const Diagonal d;
     EXPECT_EQ(d.rowCount(), 0);

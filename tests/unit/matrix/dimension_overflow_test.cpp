@@ -1,6 +1,9 @@
 #include <climits>
+#include <cstddef>
+#include <cstdint>
 #include <new>
 
+#include "matrix/matrix_dimensions.h"
 #include "support/failing_new.h"
 #include "unit/matrix/matrix_kinds.h"
 
@@ -71,6 +74,13 @@ TEST(PossibleShape, HugeCountsWithoutElementsAreFine) {
 TEST(ImpossibleVectorShape, NegativeColumnCountIsRefused) {
     EXPECT_THROW(static_cast<void>(Dense(Vec{1, 2, 3}, -1)), MatrixException);
     EXPECT_THROW(static_cast<void>(Dense(Vec{1, 2, 3}, INT_MIN)), MatrixException);
+}
+
+TEST(ImpossibleVectorShape, LengthBeyondTheRangeOfIntIsNoDimension) {
+    using qan::matrix_library::toDimension;
+    EXPECT_EQ(toDimension(std::size_t{INT_MAX}), INT_MAX);
+    EXPECT_THROW(toDimension(std::size_t{INT_MAX} + 1), MatrixException);
+    EXPECT_THROW(toDimension(SIZE_MAX), MatrixException);
 }
 
 class ImpossibleOrder : public testing::TestWithParam<int> {};

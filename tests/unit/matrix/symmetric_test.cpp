@@ -47,6 +47,7 @@ TEST(Symmetric, MirroredPositionsAreOneElement) {
     EXPECT_EQ(s(2, 0), 7.0);
     s.at(2, 1) = 8.0;
     EXPECT_EQ(s.at(1, 2), 8.0);
+    EXPECT_EQ(std::as_const(s).at(1, 2), 8.0);
     EXPECT_EQ(&s(0, 1), &s(1, 0));
 }
 

@@ -281,7 +281,7 @@ TEST(Seeder, DiffersFromThreadToThread) {
     std::array<std::vector<double>, kThreads> drawn;
     std::vector<std::thread> threads;
     for (std::vector<double>& seeds : drawn) {
-        threads.emplace_back([&seeds, count] {
+        threads.emplace_back([&seeds] {
             for (std::size_t i = 0; i < count; ++i) {
                 seeds.push_back(ruv_Seeder());
             }

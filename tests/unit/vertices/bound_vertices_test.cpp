@@ -21,16 +21,52 @@ TEST(BoundVertices, TheWholeSimplexHasTheUnitVectorsInTheOrderOfTheBoundCombinat
     EXPECT_TRUE(sameTable(found.points, {{0, 0, 1}, {1, 0, 0}, {0, 1, 0}}));
 }
 
-TEST(BoundVertices, TheWholeSimplexOfTwentyComponentsHasTwentyVertices) {
-    const auto found = enumerated(region(std::vector<double>(20, 0.0), std::vector<double>(20, 1.0)));
-    EXPECT_EQ(found.numVertices, 20U);
+class SimplexOfManyComponents : public testing::TestWithParam<std::size_t> {};
+
+TEST_P(SimplexOfManyComponents, HasItsCorners) {
+    const std::size_t q = GetParam();
+    const auto found = enumerated(region(std::vector<double>(q, 0.0), std::vector<double>(q, 1.0)));
+    EXPECT_EQ(found.numVertices, q);
     std::set<std::vector<double>> unitVectors;
-    for (std::size_t j = 0; j < 20; ++j) {
-        std::vector<double> x(20, 0.0);
+    for (std::size_t j = 0; j < q; ++j) {
+        std::vector<double> x(q, 0.0);
         x[j] = 1.0;
         unitVectors.insert(x);
     }
     EXPECT_EQ(std::set<std::vector<double>>(found.points.begin(), found.points.end()), unitVectors);
+}
+
+TEST_P(SimplexOfManyComponents, HalfCutOffHasTheMiddlesOfItsEdges) {
+    const std::size_t q = GetParam();
+    const auto found = enumerated(region(std::vector<double>(q, 0.0), std::vector<double>(q, 0.5)));
+    EXPECT_EQ(found.numVertices, q * (q - 1) / 2);
+    std::set<std::vector<double>> middles;
+    for (std::size_t j = 0; j < q; ++j) {
+        for (std::size_t k = 0; k < j; ++k) {
+            std::vector<double> x(q, 0.0);
+            x[j] = x[k] = 0.5;
+            middles.insert(x);
+        }
+    }
+    EXPECT_EQ(std::set<std::vector<double>>(found.points.begin(), found.points.end()), middles);
+}
+
+// Which components are at their upper bounds is kept in words of 64 bits.
+INSTANTIATE_TEST_SUITE_P(Components, SimplexOfManyComponents, testing::Values(20, 63, 64, 65, 130),
+                         testing::PrintToStringParamName());
+
+TEST(BoundVertices, ComponentsAreOrderedByRangesThatDifferByMoreThanTheToleranceOnly) {
+    // Differences of exactly the tolerance, of a hair less and a hair more; all are doubled without rounding.
+    constexpr double kTolerance = 1e-12;
+    for (const double factor : {1.0, 1.0 - 0x1p-50, 1.0 + 0x1p-50}) {
+        const double step = kTolerance * factor;
+        for (const std::vector<double>& upper :
+             {std::vector<double>{2 * step, step, 1, 1}, std::vector<double>{1, 2 * step, step, 1},
+              std::vector<double>{4 * step, 2 * step, step, 1}}) {
+            const PlainRegion made = region({0, 0, 0, 0}, upper);
+            EXPECT_TRUE(sameEnumeration(enumerated(made), plainlyEnumerated(made))) << factor;
+        }
+    }
 }
 
 TEST(BoundVertices, WithoutConstraintsThereAreTwoPlanesForEachComponent) {

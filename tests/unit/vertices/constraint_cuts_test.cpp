@@ -56,6 +56,16 @@ TEST(ConstraintCuts, ValuesAreInTheUnitsOfTheTotal) {
     EXPECT_TRUE(sameTable(enumerated(of200).points, enumerated(simplexWith({atMost(0.5, {1, 0, 0})})).points));
 }
 
+TEST(ConstraintCuts, CoefficientsWhoseDifferenceOverflowsAddNoVertexTwice) {
+    // From (-1, 1, 1) to (1, -1, 1) the plane's values differ by more than a double holds: the cut point is the kept
+    // vertex itself, although it lies far from the plane.
+    PlainRegion region = simplexWith({atLeast(0.0, {0.8e308, -0.8e308, 0})});
+    region.lower.assign(3, -1.0);
+    const auto found = enumerated(region);
+    EXPECT_TRUE(sameEnumeration(found, plainlyEnumerated(region)));
+    EXPECT_EQ(std::count(found.points.begin(), found.points.end(), std::vector<double>{1, -1, 1}), 1);
+}
+
 TEST(ConstraintCuts, BoundsBecomeTheImpliedBounds) {
     const auto found = enumerated(simplexWith({between(0.25, 0.5, {1, 0, 0})}));
     EXPECT_EQ(found.lower, (std::vector<double>{0.25, 0, 0}));
