@@ -230,7 +230,7 @@ enum {
     des_UnitsAmount = 0,
     /** Actual proportions. */
     des_UnitsProportion = 1,
-    /** Proportions of the L-pseudo-components. */
+    /** Proportions of the L-pseudo-components; not finite where bounds and constraints leave a single mixture. */
     des_UnitsPseudo = 2
 };
 

@@ -18,7 +18,6 @@ namespace {
 /// with the drawn numbers themselves that is 20 bytes a run.
 class KeyedIndex {
   public:
-    KeyedIndex() = default;
     KeyedIndex(double key, std::uint32_t index) : index_(index) {
         const std::uint64_t image = orderedImage(key);
         std::memcpy(key_, &image, sizeof image);
