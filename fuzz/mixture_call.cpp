@@ -1,5 +1,6 @@
 #include "mixture_call.h"
 
+#include <iterator>
 #include <span>
 #include <tuple>
 
@@ -86,16 +87,16 @@ void MixtureCall::pointAtArrays() {
 }
 
 void MixtureCall::leaveOut(std::size_t array) {
-    const double** const amounts = &design_->amounts;
     double** const numbers[] = {&design_->lowerBounds,       &design_->upperBounds,       &design_->scaledLowerBounds,
                                 &design_->scaledUpperBounds, &design_->pseudoLowerBounds, &design_->pseudoUpperBounds};
     std::uint32_t** const counts[] = {&design_->pointsPerType, &design_->boundaryCounts};
-    if (array < std::size(numbers)) {
+    static_assert(std::size(numbers) + std::size(counts) == kAmountsArray);
+    if (array == kAmountsArray) {
+        design_->amounts = nullptr;
+    } else if (array < std::size(numbers)) {
         *numbers[array] = nullptr;
-    } else if (array < std::size(numbers) + std::size(counts)) {
-        *counts[array - std::size(numbers)] = nullptr;
     } else {
-        *amounts = nullptr;
+        *counts[array - std::size(numbers)] = nullptr;
     }
 }
 

@@ -40,9 +40,8 @@ std::span<const std::int32_t> processLevelsOf(const des_MixtureDesign& design, c
 /// The code of the checks that come first, which change nothing; des_Success where they pass.
 std::int32_t expectedCode(const MixtureRequest& request, const MixtureEngine& engine) {
     if (engine.codeBeforeArrays != des_Success) return engine.codeBeforeArrays;
-    constexpr std::size_t kAmounts = 8;
     const bool hasEntries =
-        request.missingArray == kAmounts ? !request.amounts.empty() : request.inputs.numComponents != 0;
+        request.missingArray == kAmountsArray ? !request.amounts.empty() : request.inputs.numComponents != 0;
     if (request.missingArray && hasEntries) return des_ErrorNullPointer;
     if (engine.codeAfterArrays != des_Success) return engine.codeAfterArrays;
     if (request.amounts.size() >= 2 && request.inputs.numProcessVariables != 0) return des_ErrorAmountsAndProcess;

@@ -1,5 +1,3 @@
-#include <cstring>
-
 #include "mixture_request.h"
 #include "require.h"
 

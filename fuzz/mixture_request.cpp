@@ -131,7 +131,7 @@ MixtureRequest drawMixtureRequest(FuzzedDataProvider& bytes, std::uint32_t numCo
     inputs.numAmounts = static_cast<std::uint32_t>(request.amounts.size());
     drawReplicates(bytes, request);
     drawBounds(bytes, request);
-    if (drawRarely(bytes, 32)) request.missingArray = bytes.ConsumeIntegralInRange<std::size_t>(0, 8);
+    if (drawRarely(bytes, 32)) request.missingArray = bytes.ConsumeIntegralInRange<std::size_t>(0, kAmountsArray);
     return request;
 }
 

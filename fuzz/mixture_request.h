@@ -11,6 +11,9 @@
 
 namespace fuzz {
 
+/// The amounts as a missing array; the arrays of a number for each component come before them.
+inline constexpr std::size_t kAmountsArray = 8;
+
 /// Everything that a caller sets before a run.
 struct MixtureRequest {
     /// The inputs that are no arrays.
@@ -19,7 +22,7 @@ struct MixtureRequest {
     std::vector<double> upperBounds;
     std::optional<std::vector<std::uint32_t>> typeReplicates;
     std::vector<double> amounts;
-    /// A required array that is left out: see CallerArrays.
+    /// A required array that is left out: its place among the CallerArrays.
     std::optional<std::size_t> missingArray;
 };
 
