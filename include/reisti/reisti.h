@@ -282,7 +282,7 @@ typedef struct des_MixtureDesign {
     double* scaledUpperBounds;
     /** Out, [q], required. Lower bounds of the L-pseudo-components: always 0. */
     double* pseudoLowerBounds;
-    /** Out, [q], required. Upper bounds of the L-pseudo-components. */
+    /** Out, [q], required. Upper bounds of the L-pseudo-components; not finite where a single mixture is left. */
     double* pseudoUpperBounds;
     /** Out, [q], required. Entry t-1: number of distinct base points of type t. */
     uint32_t* pointsPerType;
